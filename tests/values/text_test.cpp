@@ -1,0 +1,193 @@
+// UTF-8 and UTF-16: conversions, single characters, and the escapes of documents.
+
+#include <gtest/gtest.h>
+
+#include <iomanip>
+#include <sstream>
+#include <string>
+
+#include "hqf/platform/paths.h"
+#include "hqf/values/c_as_xml.h"
+#include "hqf/values/text.h"
+#include "hqf/values/transcode.h"
+#include "hqf/values/xml_escape.h"
+
+namespace {
+
+using namespace lmx;
+
+const std::string clef8 = "\xF0\x9D\x84\x9E";               // U+1D11E
+const std::string split_clef8 = "\xED\xA0\xB4\xED\xB4\x9E"; // the same as two surrogates of three bytes
+const std::wstring clef16 = {wchar_t(0xD834), wchar_t(0xDD1E)};
+const std::wstring high = {wchar_t(0xD834)};
+const std::wstring low = {wchar_t(0xDD1E)};
+
+// Each row also runs behind ASCII of every length up to 17, which moves it through every step of the word-wise scan.
+TEST(convert, utf8_to_wide) {
+    const struct {
+        std::string in;
+        std::wstring out;
+        const char* why;
+    } rows[] = {{"", L"", "nothing"},
+                {"a\x7F", L"a\x7F", "ASCII up to its end"},
+                {std::string("a\0b", 3), std::wstring(L"a\0b", 3), "NUL is a character"},
+                {"\xC2\x80\xDF\xBF", {wchar_t(0x80), wchar_t(0x7FF)}, "two bytes"},
+                {"\xE0\xA0\x80\xEF\xBF\xBF", {wchar_t(0x800), wchar_t(0xFFFF)}, "three bytes"},
+                {clef8 + "x", clef16 + L"x", "four bytes give a pair"},
+                {split_clef8 + "x", clef16 + L"x", "a pair in six bytes"},
+                {"\xED\xB4\x9Ex", low + L"x", "a lone low surrogate is kept"},
+                {"a\xED\xA0\xB4x", L"a", "a high surrogate without its low one ends it"},
+                {"a\xED\xA0\xB4", L"a", "a pending high surrogate is dropped"},
+                {"a\xED\xA0\xB4" + clef8, L"a", "a pair of its own is no low surrogate"},
+                {"\xC0\xAF", L"/", "overlong forms pass"},
+                {"a\xC3", L"a", "lead byte at the end"},
+                {"a\xE2\x82", L"a", "three bytes cut off"},
+                {"a\xF0\x9D\x84", L"a", "four bytes cut off"},
+                {"a\xC3(b", L"a", "missing continuation"},
+                {"a\xE2\x82(b", L"a", "missing third byte"},
+                {"a\x80z", L"a", "continuation without lead"},
+                {"a\xF8\x88\x80\x80\x80z", L"a", "five-byte lead"}};
+    for (const auto& row : rows)
+        for (std::size_t prefix = 0; prefix < 18; ++prefix) {
+            std::wstring out = L"old";
+            EXPECT_EQ(&convert(&out, std::string(prefix, '.') + row.in), &out);
+            EXPECT_EQ(out, std::wstring(prefix, L'.') + row.out) << row.why << " behind " << prefix;
+        }
+    std::string narrow = "old";
+    EXPECT_EQ(vtostring(narrow, "a\xC3"), "a\xC3") << "the narrow form is a plain copy";
+    std::wstring wide = L"kept ";
+    hqf::append_wide(wide, clef8.data(), clef8.size());
+    EXPECT_EQ(wide, L"kept " + clef16);
+}
+
+TEST(convert, wide_to_utf8_and_escaped) {
+    const struct {
+        std::wstring in;
+        std::string plain, escaped;
+        const char* why;
+    } rows[] = {
+        {L"", "", "", "nothing"},
+        {L"a>b&c<'\"", "a>b&c<'\"", "a>b&amp;c&lt;&apos;&quot;", "the four escapes, and > as it is"},
+        {{wchar_t(0x7F), wchar_t(0x80), wchar_t(0x7FF)}, "\x7F\xC2\x80\xDF\xBF", "\x7F\xC2\x80\xDF\xBF", "two bytes"},
+        {{wchar_t(0x800), wchar_t(0xFFFF)}, "\xE0\xA0\x80\xEF\xBF\xBF", "\xE0\xA0\x80\xEF\xBF\xBF", "three bytes"},
+        {clef16 + L"x", clef8 + "x", clef8 + "x", "a pair is joined"},
+        {L"a" + high + L"Ab",
+         "a\xED\xA0\xB4"
+         "b",
+         "a", "unpaired high: the next element is lost, escaping ends"},
+        {L"a" + high, "a\xED\xA0\xB4", "a", "unpaired high at the end"},
+        {L"a" + high + clef16, "a\xED\xA0\xB4\xED\xB4\x9E", "a", "high before a pair swallows its first half"},
+        {low + L"&", "\xED\xB4\x9E&", "\xED\xB4\x9E&amp;", "a lone low surrogate"},
+        {{wchar_t(0x1D11E), L'x'}, clef8 + "x", clef8 + "x", "one 32-bit element"},
+        {{wchar_t(0x110000), L'x'}, "\xEF\xBF\xBDx", "\xEF\xBF\xBDx", "no character at all"},
+        {{wchar_t(0xFFFFFF3C), L'x'}, "\xEF\xBF\xBDx", "\xEF\xBF\xBDx", "its low byte is a less-than sign"}};
+    for (const auto& row : rows) {
+        std::string out = "old";
+        EXPECT_EQ(convert(&out, row.in), row.plain) << row.why;
+        for (const std::size_t prefix : {0u, 1u, 505u, 506u, 507u, 512u, 1100u}) { // around the size of a block
+            std::ostringstream os;
+            const std::wstring in = std::wstring(prefix, L'.') + row.in;
+            os << c_as_xml(in);
+            EXPECT_EQ(os.str(), std::string(prefix, '.') + row.escaped) << row.why << " behind " << prefix;
+            std::string appended = "kept";
+            hqf::append_xml_escaped(appended, in.data(), in.size());
+            EXPECT_EQ(appended, "kept" + os.str()) << row.why;
+        }
+    }
+}
+
+TEST(c_as_xml, narrow_text) {
+    const std::string in = "a>b&c\"'<\xFF" + std::string(600, '&');
+    std::string expected = "a>b&amp;c&quot;&apos;&lt;\xFF";
+    for (int i = 0; i < 600; ++i)
+        expected += "&amp;";
+    std::ostringstream xml, escaped;
+    xml << std::setw(5) << c_as_xml(in);
+    escaped << c_as_escaped<std::string>(in);
+    EXPECT_EQ(xml.str(), expected);
+    EXPECT_EQ(escaped.str(), expected);
+    std::string appended;
+    hqf::append_xml_escaped(appended, in.data(), in.size());
+    EXPECT_EQ(appended, expected);
+}
+
+TEST(c_as_ascii, everything_above_ascii_is_a_point) {
+    std::ostringstream os;
+    os << c_as_ascii<std::wstring>(L"a&\x7F\x80" + clef16 + std::wstring{wchar_t(0x1D11E), wchar_t(0xFFFFFF41)});
+    EXPECT_EQ(os.str(), "a&\x7F.....");
+}
+
+TEST(unicode_char_to_utf8, bounds_of_each_length) {
+    const struct {
+        int c;
+        const char* out;
+    } rows[] = {{0x41, "A"},
+                {0x7F, "\x7F"},
+                {0x80, "\xC2\x80"},
+                {0x7FF, "\xDF\xBF"},
+                {0x800, "\xE0\xA0\x80"},
+                {0xD834, "\xED\xA0\xB4"},
+                {0xFFFF, "\xEF\xBF\xBF"},
+                {0x10000, "\xF0\x90\x80\x80"},
+                {0x10FFFF, "\xF4\x8F\xBF\xBF"},
+                {-1, "\xFF"}};
+    for (const auto& row : rows) {
+        char out[5] = {'?', '?', '?', '?', '?'};
+        EXPECT_EQ(unicode_char_to_utf8(row.c, out), out);
+        EXPECT_STREQ(out, row.out) << row.c;
+    }
+}
+
+TEST(utf8_to_unicode_char, value_or_what_was_built) {
+    const struct {
+        const char* in;
+        bool ok;
+        int value;
+        const char* why;
+    } rows[] = {{"A", true, 0x41, "one byte"},
+                {"\xDF\xBF", true, 0x7FF, "two"},
+                {"\xED\xA0\xB4", true, 0xD834, "three"},
+                {"\xF4\x8F\xBF\xBF", true, 0x10FFFF, "four"},
+                {"\xC3(", false, 3, "no second byte"},
+                {"\xE2\x82(", false, 0x82, "no third"},
+                {"\xF0", false, 0, "NUL is no continuation"},
+                {"\x80", false, -1, "continuation first"},
+                {"\xF8\x88\x80\x80\x80", false, -1, "five bytes"}};
+    for (const auto& row : rows) {
+        int value = 99;
+        EXPECT_EQ(utf8_to_unicode_char(row.in, &value), row.ok) << row.why;
+        EXPECT_EQ(value, row.value) << row.why;
+    }
+}
+
+TEST(is_valid_utf8_char_sequence, first_two_bytes_decide) {
+    const struct {
+        int first_low, first_high, second_low, second_high; // 0 to 255 where the second byte plays no part
+    } valid[] = {{0x00, 0x7F, 0, 255},     {0xC2, 0xDF, 0, 255},     {0xE0, 0xE0, 0xA0, 0xBF},
+                 {0xE1, 0xEC, 0, 255},     {0xED, 0xED, 0x80, 0x9F}, {0xEE, 0xEF, 0, 255},
+                 {0xF0, 0xF0, 0x90, 0xBF}, {0xF1, 0xF3, 0, 255},     {0xF4, 0xF4, 0x80, 0x8F}};
+    for (int first = 0; first < 256; ++first)
+        for (int second = 0; second < 256; ++second) {
+            bool expected = false;
+            for (const auto& row : valid)
+                expected |= first >= row.first_low && first <= row.first_high && second >= row.second_low &&
+                            second <= row.second_high;
+            const char in[] = {static_cast<char>(first), static_cast<char>(second), '\0'};
+            ASSERT_EQ(is_valid_utf8_char_sequence(in), expected) << first << " " << second;
+        }
+}
+
+TEST(paths, wide_paths_reach_the_file_system_as_utf8) {
+    EXPECT_EQ(hqf::path_to_utf8(L"/t\x00E4\x20AC" + clef16 + std::wstring{wchar_t(0x1D11E)} + high + L"A"),
+              "/t\xC3\xA4\xE2\x82\xAC" + clef8 + clef8 + "\xED\xA0\xB4" + "A");
+    std::wstring wide;
+    const std::wstring path = convert(&wide, testing::TempDir()) + L"hqf_\x00E4" + clef16;
+    EXPECT_EQ(hqf::open_file(path, "rb"), nullptr);
+    std::FILE* const file = hqf::open_file(path, "wb");
+    ASSERT_NE(file, nullptr);
+    std::fclose(file);
+    EXPECT_TRUE(hqf::remove_file(path));
+    EXPECT_FALSE(hqf::remove_file(path));
+}
+
+} // namespace
