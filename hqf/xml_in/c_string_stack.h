@@ -1,0 +1,45 @@
+#pragma once
+
+#include <cstddef>
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace lmx {
+
+/// The names of the elements that are being read, outermost first: one run of bytes, each name with a NUL behind it.
+class c_string_stack {
+public:
+    /// Size in bytes, NULs included; not the number of names.
+    std::size_t get_stack_size() const { return bytes_.size(); }
+
+private:
+    friend class c_string_stack_node;
+
+    std::vector<char> bytes_;
+};
+
+/// Keeps a name on the stack for a scope. Nodes end in reverse order of their start.
+class c_string_stack_node {
+public:
+    c_string_stack_node(c_string_stack& stack, std::string_view name)
+        : stack_(stack)
+        , offset_(stack.bytes_.size()) {
+        stack.bytes_.insert(stack.bytes_.end(), name.begin(), name.end());
+        stack.bytes_.push_back('\0');
+    }
+    c_string_stack_node(const c_string_stack_node&) = delete;
+    c_string_stack_node& operator=(const c_string_stack_node&) = delete;
+    ~c_string_stack_node() { stack_.bytes_.resize(offset_); }
+
+    /// The name. Valid until the next name is pushed.
+    const char* get_str() const { return stack_.bytes_.data() + offset_; }
+    bool operator==(const std::string& name) const { return std::string_view(get_str()) == name; }
+    bool operator!=(const std::string& name) const { return !(*this == name); }
+
+private:
+    c_string_stack& stack_;
+    const std::size_t offset_;
+};
+
+} // namespace lmx

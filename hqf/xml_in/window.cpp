@@ -1,0 +1,152 @@
+#include "hqf/xml_in/window.h"
+
+#include "hqf/xml_in/byte_scan.h"
+#include "hqf/xml_in/c_get_as_utf8.h"
+#include "hqf/xml_in/c_read_file.h"
+#include "hqf/xml_in/c_read_memory.h"
+
+#include <algorithm>
+#include <limits>
+
+namespace hqf {
+namespace {
+
+// Bytes that stay between the edge and the end of the memory, so that wide loads near the edge are safe: 64 for them,
+// and what a character that crosses the end of a proof may take.
+constexpr std::ptrdiff_t margin = 64 + 4;
+// Bytes proven at a time.
+constexpr std::ptrdiff_t chunk = 16 * 1024;
+// A file is read on when fewer bytes than this lie ahead, in blocks of the larger size. Values that don't fit are left
+// to the general path, or to `grow`.
+constexpr std::size_t fair_run = 64 * 1024;
+constexpr std::size_t file_block = 256 * 1024;
+
+} // namespace
+
+// Finds where the source keeps its position; false for a source that is never read ahead.
+bool window::find_run() {
+    switch (owner_.source_) {
+    case lmx::c_get_as_utf8::memory_source: {
+        auto& memory = static_cast<lmx::c_read_memory&>(owner_.input_);
+        run_ = &memory.run_;
+        block_start_ = memory.start_;
+        return true;
+    }
+    case lmx::c_get_as_utf8::file_source:
+        file_ = &static_cast<lmx::c_read_file&>(owner_.input_);
+        run_ = &file_->run_;
+        block_start_ = file_->block_start_;
+        return file_->is_opened_here_;
+    default: return false;
+    }
+}
+
+// Characters that were given back are taken from the bytes again, if they are the ones that stand there. A line end is
+// not: it has been counted already. Nor is a byte above ASCII: it may be the end of a character.
+bool window::settle_ungot() {
+    lmx::c_unget_buffer& ungot = owner_.ungot_;
+    if (ungot.empty()) {
+        // The general path would drop the LF of a CR LF that it has read half of.
+        if (owner_.last_character_ == '\r' && !run_->empty() && *run_->cursor == '\n') {
+            ++run_->cursor;
+            owner_.last_character_ = '\n';
+        }
+        return true;
+    }
+    if (run_->cursor - block_start_ < ungot.size()) return false;
+    for (int i = 0; i < ungot.size(); ++i) {
+        const int c = static_cast<unsigned char>(run_->cursor[-1 - i]);
+        if (c != ungot.at(i) || c == '\n' || c == '\r' || c > 127) return false;
+    }
+    run_->cursor -= ungot.size();
+    ungot.clear();
+    owner_.last_character_ = 0;
+    return true;
+}
+
+bool window::open() {
+    if (is_open_) close();
+    if (owner_.errors_.is_fatal_errored() || owner_.state_ != lmx::c_get_as_utf8::utf8 ||
+        owner_.sequence_cursor_ != nullptr || !find_run() || !settle_ungot())
+        return false;
+    const std::uint64_t generation = file_ == nullptr ? 0 : file_->taken_from_file_;
+    const bool is_edge_good = generation == edge_generation_ && edge_ >= run_->cursor && edge_ <= run_->end;
+    const std::ptrdiff_t proven = is_edge_good ? edge_ - run_->cursor : 0;
+    if (file_ != nullptr) {
+        file_->read_ahead(fair_run, file_block);
+        edge_generation_ = file_->taken_from_file_;
+        low_water_ = file_->may_have_more() ? fair_run : 0;
+    }
+    p = step_start_ = opened_at_ = counted_ = run_->cursor;
+    end_ = run_->end;
+    edge_ = p + proven;
+    owner_.run_ = &owner_.nothing_;
+    is_open_ = true;
+    return true;
+}
+
+void window::close() {
+    count_up_to(p);
+    owner_.last_character_ = byte_before(p);
+    run_->cursor = p;
+    owner_.run_ = run_;
+    is_open_ = false;
+}
+
+bool window::grow() {
+    if (file_ == nullptr || end_ - edge_ > margin || !file_->may_have_more()) return false;
+    const std::size_t wanted = 2 * static_cast<std::size_t>(end_ - p);
+    close();
+    const std::ptrdiff_t proven = edge_ - p;
+    file_->read_ahead(wanted, std::max(wanted, file_block));
+    edge_ = run_->cursor + proven;
+    edge_generation_ = file_->taken_from_file_;
+    return open();
+}
+
+bool window::prove_more() {
+    if (end_ - edge_ <= margin) return false;
+    const char* const stop = edge_ + std::min(chunk, end_ - edge_ - margin);
+    const char* const proven = find_not_plain(edge_, stop);
+    if (proven == edge_) return false;
+    edge_ = proven;
+    return true;
+}
+
+bool window::prove(std::size_t n) {
+    while (static_cast<std::size_t>(edge_ - p) < n)
+        if (!prove_more()) return false;
+    return true;
+}
+
+bool window::text(char stop, std::string_view& piece) {
+    const char* at = p;
+    for (;;) {
+        at = find_text_end(at, edge_, stop);
+        if (at != edge_) break;
+        if (!prove_more()) return false;
+    }
+    if (*at != stop) return false;
+    piece = {p, static_cast<std::size_t>(at - p)};
+    p = at;
+    return true;
+}
+
+// The last character that the general path would have delivered before a place.
+unsigned char window::byte_before(const char* place) const {
+    return place == opened_at_ ? owner_.last_character_ : static_cast<unsigned char>(place[-1]);
+}
+
+void window::count_up_to(const char* place) {
+    const long long lines = owner_.line_ + count_line_ends(counted_, place, byte_before(counted_));
+    owner_.line_ = static_cast<int>(std::min<long long>(lines, std::numeric_limits<int>::max()));
+    counted_ = place;
+}
+
+int window::line() {
+    count_up_to(step_start_);
+    const long long lines = owner_.line_ + count_line_ends(counted_, p, byte_before(counted_));
+    return static_cast<int>(std::min<long long>(lines, std::numeric_limits<int>::max()));
+}
+
+} // namespace hqf

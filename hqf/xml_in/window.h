@@ -1,0 +1,98 @@
+#pragma once
+
+#include "hqf/xml_in/byte_run.h"
+#include "hqf/xml_in/byte_scan.h"
+
+#include <cstddef>
+#include <cstdint>
+#include <string_view>
+
+namespace lmx {
+class c_get_as_utf8;
+class c_read_file;
+} // namespace lmx
+
+namespace hqf {
+
+/// A look at the bytes ahead that need nothing special, so that names and values can be found in them with wide steps.
+///
+/// The general path delivers one character at a time and is the truth. A window opens on a document in UTF-8 that lies
+/// in memory, or in a file that this library opened, wherever the general path stands between two characters; reading
+/// on through the general path closes it, and both go on from the same byte with the same line number.
+///
+/// A window reports nothing and decides nothing. Its operations either do what they say or change nothing; whoever gets
+/// false goes back to a mark and lets the general path read the same bytes. Only `begin_step` moves bytes in memory:
+/// marks and pieces last until its next call, or `grow`'s.
+class window {
+public:
+    explicit window(lmx::c_get_as_utf8& owner)
+        : owner_(owner) {}
+    window(const window&) = delete;
+    window& operator=(const window&) = delete;
+
+    /// The next byte. May be moved forward within `edge()`; at least 64 bytes from here can be loaded.
+    const char* p = nullptr;
+
+    /// Opens the window if need be and sees to it that a fair run of bytes lies ahead. False: take a general step.
+    bool begin_step() {
+        if (is_open_ && static_cast<std::size_t>(end_ - p) >= low_water_) {
+            step_start_ = p;
+            return true;
+        }
+        return open();
+    }
+    bool is_open() const { return is_open_; }
+    /// Hands position, line and last character back to the general path.
+    void close();
+
+    const char* mark() const { return p; }
+    /// Back to a mark of this step.
+    void back(const char* mark) { p = mark; }
+
+    /// Up to here bytes are proven: UTF-8 that the general path would deliver unchanged, without U+0085 and U+2028,
+    /// without control characters but 9 to 13. A CR may be there: as white space it is harmless, in a value it is not.
+    const char* edge() const { return edge_; }
+    /// Whether `n` bytes from `p` are proven; tries to prove more if not.
+    bool room(std::size_t n) { return static_cast<std::size_t>(edge_ - p) >= n || prove(n); }
+    /// Over white space, as far as bytes can be proven.
+    void skip_space() {
+        do {
+            p = hqf::skip_space(p, edge_);
+        } while (p == edge_ && prove_more());
+    }
+    /// Gives the bytes up to `stop`, which stays next. False if a '&' or a CR comes first, or bytes that can't be
+    /// proven. Line feeds and tabs may be among them.
+    bool text(char stop, std::string_view& piece);
+    /// After a failure for want of bytes (not for a doubtful one): reads at least twice as many. `p` must be back at
+    /// the start of the step; marks are lost. False when there are no more.
+    bool grow();
+
+    /// The line at `p`. Lines are counted when someone asks, each byte once but for those of the current step.
+    int line();
+
+private:
+    bool open();
+    bool find_run();
+    bool settle_ungot();
+    bool prove(std::size_t n);
+    bool prove_more();
+    unsigned char byte_before(const char* place) const;
+    void count_up_to(const char* place);
+
+    lmx::c_get_as_utf8& owner_;
+    bool is_open_ = false;
+    const char* end_ = nullptr;
+    const char* edge_ = nullptr;
+    const char* step_start_ = nullptr;
+    const char* opened_at_ = nullptr;
+    const char* counted_ = nullptr;
+    std::size_t low_water_ = 0;
+    // Where the source keeps its position, and where its block in memory starts.
+    byte_run* run_ = nullptr;
+    const char* block_start_ = nullptr;
+    lmx::c_read_file* file_ = nullptr;
+    // What the file had delivered when `edge_` was found: another figure means other bytes in the same memory.
+    std::uint64_t edge_generation_ = 0;
+};
+
+} // namespace hqf

@@ -1,0 +1,111 @@
+#include "hqf/xml_out/output.h"
+
+#include <typeinfo>
+
+#include "hqf/values/c_as_xml.h"
+#include "hqf/values/datetime_text.h"
+#include "hqf/values/number_text.h"
+#include "hqf/values/xml_escape.h"
+
+namespace hqf {
+
+output::output(lmx::c_xml_writer& writer)
+    : writer_(writer)
+    , stream_(writer_access::stream(writer))
+    , tab_(writer_access::tab(writer))
+    , newline_(writer_access::newline(writer))
+    , tab_length_(std::strlen(tab_))
+    , newline_length_(std::strlen(newline_))
+    , plain_(typeid(writer) == typeid(lmx::c_xml_writer))
+    , standard_numbers_(has_default_format(stream_)) {}
+
+void output::flush() {
+    if (at_ == block_) return;
+    const std::streamsize size = at_ - block_;
+    at_ = block_;
+    stream_.write(block_, size);
+}
+
+void output::text(const char* data, std::size_t size) {
+    if (size > sizeof(block_) / 2) {
+        flush();
+        stream_.write(data, static_cast<std::streamsize>(size));
+        return;
+    }
+    reserve(size);
+    std::memcpy(at_, data, size);
+    at_ += size;
+}
+
+void output::indent_slowly() {
+    for (int level = 0; level < writer_access::nest_level(writer_); ++level)
+        text(tab_, tab_length_);
+}
+
+void output::indent_through_writer() {
+    flush();
+    writer_(true);
+}
+
+void output::line_end_through_writer() {
+    flush();
+    const char* newline = writer_.endl();
+    text(newline, std::strlen(newline));
+}
+
+void output::value(const std::wstring& text) {
+    const wchar_t* next = text.data();
+    const wchar_t* const end = next + text.size();
+    while (next != end) {
+        reserve(escaped_size);
+        at_ = write_xml_escaped(at_, block_ + sizeof(block_), next, end);
+    }
+}
+
+void output::value(double number) {
+    if (!standard_numbers_) {
+        flush();
+        stream_ << lmx::c_as_xml(number);
+        return;
+    }
+    reserve(number_text_size);
+    at_ = write_number(at_, number);
+}
+
+void output::value(int number) {
+    if (!standard_numbers_) {
+        flush();
+        stream_ << number;
+        return;
+    }
+    reserve(number_text_size);
+    at_ = write_number(at_, number);
+}
+
+void output::value(unsigned int number) {
+    if (!standard_numbers_) {
+        flush();
+        stream_ << number;
+        return;
+    }
+    reserve(number_text_size);
+    at_ = write_number(at_, number);
+}
+
+void output::value(const lmx::c_datetime& moment) {
+    if (!standard_numbers_) {
+        flush();
+        stream_ << moment;
+        return;
+    }
+    reserve(datetime_text_size);
+    at_ = write_datetime(at_, moment);
+    stream_.fill('0'); // as the insertion would leave it
+}
+
+void output::value(const lmx::c_binary& bytes) {
+    flush();
+    bytes.out_base64(stream_);
+}
+
+} // namespace hqf
