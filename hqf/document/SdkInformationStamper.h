@@ -1,0 +1,16 @@
+#pragma once
+
+namespace hqf_v2 {
+
+class Hqf;
+
+/// Writes the library's identity into a document's header. Holds nothing; lives for one stamp.
+class SdkInformationStamper {
+public:
+    /// Assigns ReadSDKInformation; marks Preamble and Header present.
+    void stampRead(Hqf& document) const;
+    /// Assigns WriteSDKInformation; marks Preamble and Header present.
+    void stampWrite(Hqf& document) const;
+};
+
+} // namespace hqf_v2

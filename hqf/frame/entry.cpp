@@ -1,0 +1,41 @@
+#include "hqf/frame/entry.h"
+
+#include <cstdio>
+#include <fstream>
+#include <sstream>
+
+namespace hqf::frame {
+
+lmx::elmx_error write_file(const char* file_name, void* object, const char* name, write_call write) {
+    std::ofstream stream(file_name, std::ios::out | std::ios::trunc);
+    if (!stream.is_open()) return lmx::err_unable_to_open_file;
+    lmx::elmx_error error = write_stream(stream, object, name, write);
+    stream.close();
+    if (error == lmx::err_no_error && stream.fail()) error = lmx::err_undefined_error;
+    if (error != lmx::err_no_error) std::remove(file_name);
+    return error;
+}
+
+lmx::elmx_error write_string(std::string* out, void* object, const char* name, write_call write) {
+    std::ostringstream stream;
+    const lmx::elmx_error error = write_stream(stream, object, name, write);
+    if (error == lmx::err_no_error) *out = std::move(stream).str();
+    return error;
+}
+
+lmx::elmx_error write_stream(std::ostream& stream, void* object, const char* name, write_call write) {
+    lmx::c_xml_writer writer(stream, lmx::c_xml_writer::include_xml_decl, layout_tab, layout_newline);
+    return write(object, writer, name);
+}
+
+lmx::elmx_error read_root(lmx::c_xml_reader& reader, const char* local_name) {
+    lmx::elmx_error error = lmx::err_no_error;
+    reader.get_element_event(nullptr, &error, &reader.item_name);
+    if (error != lmx::err_no_error) error = reader.handle_error(error, reader.item_name, "Hqf", __LINE__);
+    if (error != lmx::err_no_error) return error;
+    if (reader.get_element_ns_id() == format_namespace_id && reader.get_local_name() == local_name)
+        return lmx::err_no_error;
+    return reader.handle_error(lmx::err_element_not_found, reader.item_name, "Hqf", __LINE__);
+}
+
+} // namespace hqf::frame

@@ -1,0 +1,106 @@
+/// Steps over the window: a value, a tag, the start of an element. Each reads what stands at the window's position in
+/// the spelling of our own writer and leaves the position behind it, or gives false: then the caller goes back to its
+/// mark, nothing has been stored, and the general road reads the same bytes.
+#pragma once
+
+#include <cstdint>
+#include <cstring>
+#include <string_view>
+
+#if defined(__SSE2__)
+#include <emmintrin.h>
+#endif
+
+#include "hqf/frame/rows.h"
+#include "hqf/xml_in/window.h"
+
+namespace hqf::frame {
+
+/// A value between its check and its store. Left without initial values: starts of elements have room for many, and
+/// most use none.
+struct parsed_value {
+    /// The text in the window, for the kinds that are stored from it.
+    const char* begin;
+    std::size_t size;
+    /// References to the predefined entities are among the text.
+    bool has_references;
+    union {
+        double real;
+        std::int64_t whole;
+        bool truth;
+        /// Number of a literal, 0 for free text.
+        int literal;
+    };
+
+    const char* end() const { return begin + size; }
+};
+
+/// Whether `size` bytes are the same. `constant` is padded to a multiple of 16, and behind `text` 16 bytes can be read.
+inline bool same_text(const char* text, const char* constant, std::size_t size) {
+#if defined(__SSE2__)
+    for (;;) {
+        const __m128i left = _mm_loadu_si128(reinterpret_cast<const __m128i*>(text));
+        const __m128i right = _mm_loadu_si128(reinterpret_cast<const __m128i*>(constant));
+        const auto equal = static_cast<unsigned int>(_mm_movemask_epi8(_mm_cmpeq_epi8(left, right)));
+        if (size <= 16) return ((equal ^ 0xFFFFu) & (0xFFFFu >> (16 - size))) == 0;
+        if (equal != 0xFFFFu) return false;
+        text += 16;
+        constant += 16;
+        size -= 16;
+    }
+#else
+    return std::memcmp(text, constant, size) == 0;
+#endif
+}
+
+/// Longest name with what stands around it; a step asks for this many proven bytes first.
+inline constexpr std::size_t longest_name_room = 96;
+
+/// Whether the start tag "<Hqf:Name" stands here, followed by its end or by attributes.
+inline bool starts(const window& in, const element_name& name) {
+    const std::size_t size = name.length - 1u;
+    return same_text(in.p, name.open, size) && (in.p[size] == '>' || in.p[size] == ' ');
+}
+
+/// Moves over "</Hqf:Name>".
+inline bool close_tag(window& in, const element_name& name) {
+    if (!in.room(longest_name_room) || in.p[0] != '<' || in.p[1] != '/' ||
+        !same_text(in.p + 2, name.open + 1, name.length - 1u))
+        return false;
+    in.p += name.length + 1;
+    return true;
+}
+
+/// A value up to `stop` that passes every check of its rules; a date and time is checked when it is stored.
+bool parse_value(window& in, kind what, const facets* rules, char stop, parsed_value& value);
+
+/// Stores a parsed value in a member of that kind; false, with nothing stored, for a date and time that is not in its
+/// common form.
+bool store_value(const parsed_value& value, kind what, const facets* rules, void* member);
+
+/// The start of an element, from "<Hqf:Name" to the end of the tag, and for simple content the value and the end tag.
+struct parsed_start {
+    static constexpr unsigned int most_attributes = 8;
+
+    unsigned int count = 0;
+    bool nil = false;
+    /// The element is read to its end.
+    bool complete = false;
+    const row* attributes[most_attributes];
+    parsed_value values[most_attributes];
+    parsed_value body;
+};
+
+/// \param object the object that the element will be read into, null for one that is yet to be made
+bool parse_start(window& in, const class_rows& rows, const element_name& name, const void* object, parsed_start& start);
+
+/// Stores attributes, the nil flag and the body in the object.
+void store_start(const parsed_start& start, const class_rows& rows, void* object);
+
+/// Moves over ` xsi:type="Hqf:Name">` and gives the name.
+bool parse_type_attribute(window& in, std::string_view& name);
+
+/// The member of a group whose start tag stands here, -1 for none.
+int find_member(const window& in, const class_rows& group);
+
+} // namespace hqf::frame

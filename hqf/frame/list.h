@@ -1,0 +1,120 @@
+/// The list behind every repeating member: pointers to objects that it owns, each allocated alone, so that a child's
+/// address stays the same while the list grows.
+#pragma once
+
+#include <cstdlib>
+#include <new>
+#include <utility>
+
+namespace hqf::frame {
+
+/// The pointers of a list, without their type: the engine appends to every list through this.
+class list_base {
+public:
+    list_base() = default;
+    list_base(const list_base&) = delete;
+    list_base& operator=(const list_base&) = delete;
+
+    unsigned int size() const { return size_; }
+    void* item(unsigned int index) const { return items_[index]; }
+
+    /// Makes room for one more pointer, so that the append that follows cannot fail.
+    ///
+    /// \throws std::bad_alloc; the list is as it was.
+    void make_room() {
+        if (size_ == capacity_) grow();
+    }
+
+    /// Takes over an object. make_room() came first.
+    void append(void* object) { items_[size_++] = object; }
+
+    /// Takes over an object in front of the one at `index`, or at the end for an index from the size up.
+    void insert(unsigned int index, void* object) {
+        append(object);
+        for (unsigned int at = size_ - 1; at > index; --at)
+            std::swap(items_[at], items_[at - 1]);
+    }
+
+    /// Gives up the last object, which the caller owns then.
+    void* take_back() { return items_[--size_]; }
+
+    /// Gives up the object at `index` and closes the gap.
+    void* take(unsigned int index) {
+        for (unsigned int at = index + 1; at < size_; ++at)
+            std::swap(items_[at], items_[at - 1]);
+        return take_back();
+    }
+
+    void swap(list_base& other) noexcept {
+        std::swap(items_, other.items_);
+        std::swap(size_, other.size_);
+        std::swap(capacity_, other.capacity_);
+    }
+
+protected:
+    ~list_base() { std::free(items_); }
+
+private:
+    void grow() {
+        const unsigned int capacity = capacity_ == 0 ? 1 : capacity_ * 2;
+        if (capacity <= capacity_) throw std::bad_alloc();
+        void* items = std::realloc(items_, sizeof(void*) * capacity);
+        if (items == nullptr) throw std::bad_alloc();
+        items_ = static_cast<void**>(items);
+        capacity_ = capacity;
+    }
+
+    void** items_ = nullptr;
+    unsigned int size_ = 0;
+    unsigned int capacity_ = 0;
+};
+
+template<class item_type>
+class list : public list_base {
+public:
+    ~list() { clear(); }
+
+    item_type& operator[](unsigned int index) const { return *static_cast<item_type*>(item(index)); }
+    item_type& back() const { return (*this)[size() - 1]; }
+
+    /// Appends an item built from the arguments.
+    template<class... arguments>
+    item_type& add(const arguments&... values) {
+        make_room();
+        auto* object = new item_type(values...);
+        append(object);
+        return *object;
+    }
+
+    /// Inserts before `index`, or appends for an index from the size up.
+    template<class... arguments>
+    void insert_new(unsigned int index, const arguments&... values) {
+        make_room();
+        insert(index, new item_type(values...));
+    }
+
+    /// The item at `index`; default items fill the list up to there first.
+    item_type& at_or_add(unsigned int index) {
+        while (size() <= index)
+            add();
+        return (*this)[index];
+    }
+
+    /// Replaces the item at `index`, or appends for an index from the size up.
+    void replace(unsigned int index, const item_type& value) {
+        if (index < size())
+            (*this)[index] = value;
+        else
+            add(value);
+    }
+
+    void remove(unsigned int index) { delete static_cast<item_type*>(take(index)); }
+
+    /// Destroys the items, from the last to the first.
+    void clear() {
+        while (size() != 0)
+            delete static_cast<item_type*>(take_back());
+    }
+};
+
+} // namespace hqf::frame

@@ -1,0 +1,107 @@
+/// How a model class holds its members. Every generated class is a row of these; what a member is (mandatory, optional,
+/// repeating, owned through a pointer) stands in its type, and the rows of the class repeat none of it.
+///
+/// Nothing here is for callers of the library: they meet the members through accessors.
+#pragma once
+
+#include <memory>
+#include <utility>
+
+#include "hqf/frame/list.h"
+
+namespace hqf::frame {
+
+struct class_rows;
+
+/// Gives the friend of every model class that builds its rows (see hqf/frame/rows.h).
+template<class model_class>
+struct rows_of;
+
+/// A simple value and whether it was set. The engine sees every single simple member as this.
+template<class value_type>
+struct value_member {
+    value_type value{};
+    bool set = false;
+};
+
+/// A mandatory value. A copy counts as set, whatever the source was.
+template<class value_type>
+struct mandatory : value_member<value_type> {
+    static constexpr bool set_in_copies = true;
+};
+
+/// A value that may be absent; its copy is absent then, too. A member with a default holds it while unset.
+template<class value_type>
+struct optional : value_member<value_type> {
+    static constexpr bool set_in_copies = false;
+};
+
+/// A complex child held by value.
+template<class model_class>
+struct child {
+    model_class object;
+    bool present = false;
+};
+
+/// A complex child on the heap without its type: what the engine sees.
+struct pointer_member {
+    pointer_member() = default;
+    pointer_member(const pointer_member&) = delete;
+    pointer_member& operator=(const pointer_member&) = delete;
+
+    void* object = nullptr;
+    bool present = false;
+};
+
+/// A complex child on the heap, made when someone asks for it: the only way for a class to contain its own kind.
+template<class model_class>
+struct child_pointer : pointer_member {
+    ~child_pointer() { delete get(); }
+    model_class* get() const { return static_cast<model_class*>(object); }
+};
+
+/// The selector of a choice and the slot that its options share: numbers lie in it, text and objects behind a pointer.
+/// The class that holds it knows the options and frees what the slot owns.
+struct choice_slot {
+    explicit choice_slot(int none)
+        : chosen(none) {}
+    choice_slot(const choice_slot&) = delete;
+    choice_slot& operator=(const choice_slot&) = delete;
+
+    int chosen;
+    union {
+        double real;
+        int integer;
+        unsigned int natural;
+        void* object = nullptr;
+    };
+};
+
+/// The selector of a substitution group and the object of the member chosen, without its type.
+struct object_slot {
+    explicit object_slot(int none)
+        : chosen(none) {}
+    object_slot(const object_slot&) = delete;
+    object_slot& operator=(const object_slot&) = delete;
+
+    int chosen;
+    /// Points at the hierarchy's root class, which lies at the start of every object below it.
+    void* object = nullptr;
+};
+
+template<class root_class>
+struct group_slot : object_slot {
+    using object_slot::object_slot;
+    ~group_slot() { delete get(); }
+    root_class* get() const { return static_cast<root_class*>(object); }
+
+    /// Gives up what is held and takes over `made` as member `index`.
+    void hold(int index, root_class* made) {
+        root_class* old = get();
+        object = made;
+        chosen = index;
+        delete old;
+    }
+};
+
+} // namespace hqf::frame
