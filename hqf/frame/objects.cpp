@@ -121,6 +121,8 @@ bool equal_rows(const row& r, const void* a, const void* b) {
         return true;
     }
     if (flag_of(r, a) != flag_of(r, b)) return false;
+    // What is absent in both is the same, whatever the storage still holds.
+    if (!flag_of(r, a)) return true;
     bool equal = true;
     const bool is_value = with_value_type(r.what, [&]<class value_type>(value_type*) {
         equal = same(member_at<value_type>(a, r.value), member_at<value_type>(b, r.value));
@@ -238,7 +240,7 @@ void swap_members(const class_rows& rows, void* a, void* b) noexcept {
 }
 
 bool equal_members(const class_rows& rows, const void* a, const void* b) {
-    if (rows.is_nil(a) != rows.is_nil(b)) return false;
+    if (rows.is_nil(a) || rows.is_nil(b)) return rows.is_nil(a) == rows.is_nil(b);
     for (unsigned int i = 0; i < rows.attribute_count; ++i)
         if (!equal_rows(rows.attributes[i], a, b)) return false;
     if (rows.shape == form::choice) return equal_choices(rows, a, b);

@@ -58,7 +58,7 @@ class _Header:
         forward = sorted(self.forward - set(self.by_value()) - {cls.name})
         head += [f"class {name};" for name in forward] + ([""] if forward else [])
         tail = ["", "} // namespace hqf_v2", "", "namespace hqf {",
-                "/// Values and set flags are the same. NaN equals NaN, and -0.0 differs from 0.0.",
+                "/// The same is set in both, and to the same values. NaN equals NaN, and -0.0 differs from 0.0.",
                 f"HQF_API bool equal(const hqf_v2::{cls.name}& a, const hqf_v2::{cls.name}& b);",
                 "} // namespace hqf", ""]
         return NOTICE + "\n".join(head + self.lines + tail)

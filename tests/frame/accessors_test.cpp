@@ -1,0 +1,318 @@
+// What the accessors of every class do, shown on one class of each shape.
+
+#include <gtest/gtest.h>
+
+#include <cmath>
+#include <limits>
+#include <memory>
+#include <sstream>
+#include <string>
+
+#include "hqf/hqf.h"
+
+namespace {
+
+using namespace hqf_v2;
+
+constexpr double nan = std::numeric_limits<double>::quiet_NaN();
+constexpr double infinity = std::numeric_limits<double>::infinity();
+
+TEST(accessors, ranges) {
+    ColorSpaceCIELabType lab;
+    ColorSpaceCIELChType lch;
+    ReflectancePointType point;
+    Process process;
+    const struct {
+        const char* what;
+        lmx::elmx_error code;
+        int expected;
+    } rows[] = {
+        {"L at its upper bound", lab.set_L(150), 0},
+        {"L just above", lab.set_L(std::nextafter(150.0, 151.0)), 36},
+        {"L at its lower bound", lab.set_L(-0.0), 0},
+        {"L just below", lab.set_L(-std::numeric_limits<double>::denorm_min()), 37},
+        {"NaN fails the minimum, which is tested first", lab.set_L(nan), 37},
+        {"infinity", lab.set_L(infinity), 36},
+        {"A on both sides", lab.set_A(-150.01), 37},
+        {"an exclusive maximum", lch.set_H(360), 36},
+        {"just inside it", lch.set_H(std::nextafter(360.0, 0.0)), 0},
+        {"L of LCh ends earlier", lch.set_L(100.5), 36},
+        {"an exclusive minimum", point.set_ReflectancePointType(-1), 37},
+        {"an exclusive maximum of a body", point.set_ReflectancePointType(10), 36},
+        {"an attribute above 0", point.set_Wavelength(0), 37},
+        {"a minimum alone", process.set_Thickness(infinity), 0},
+    };
+    for (const auto& row : rows)
+        EXPECT_EQ(row.code, row.expected) << row.what;
+    EXPECT_TRUE(std::signbit(lab.get_L())) << "the last good value stays, its sign too";
+    EXPECT_FALSE(point.is_occurs_ok()) << "nothing was stored";
+}
+
+TEST(accessors, integers) {
+    DeviceSettings settings;
+    Averaging averaging;
+    IlluminationOptionsType illumination;
+    EXPECT_EQ(settings.set_Aperture(0), 0) << "the setter leaves the minimum to the reader";
+    EXPECT_EQ(settings.set_Aperture(2147483648u), 36);
+    EXPECT_EQ(settings.get_Aperture(), 0u);
+    EXPECT_EQ(settings.set_LensPosition(std::numeric_limits<int>::min()), 0);
+    EXPECT_EQ(averaging.set_AveragingValue(1), 37);
+    EXPECT_EQ(averaging.set_AveragingValue(100), 36);
+    EXPECT_EQ(averaging.set_AveragingValue(99), 0);
+    EXPECT_EQ(illumination.set_ColorTemperature(0x80000000u), 36);
+    EXPECT_EQ(illumination.getchosen(), IlluminationOptionsType::chosen_ColorTemperature)
+        << "chosen before it is checked";
+    EXPECT_EQ(illumination.set_ColorTemperature(0), 0);
+}
+
+TEST(accessors, texts) {
+    ProfileType_Parameters parameter;
+    ColorSpaceMunsellType munsell;
+    EXPECT_EQ(parameter.set_Name(L""), 20);
+    EXPECT_EQ(parameter.set_Name(L"ab"), 19);
+    EXPECT_EQ(parameter.set_Name(L"\xD834\xDD1E"), 19) << "a setter counts wide units";
+    EXPECT_EQ(parameter.set_Name(L"a"), 0);
+    EXPECT_EQ(munsell.set_ColorName(L""), 20);
+    EXPECT_TRUE(munsell.get_ColorName().empty());
+    ColorType colour;
+    EXPECT_EQ(colour.set_ColorName(L""), 0) << "presence is the rule, not length";
+}
+
+TEST(accessors, enumerations) {
+    DensityType density;
+    EXPECT_EQ(density.set_DensityStatus(L"Status_DIN-NB"), 0);
+    EXPECT_EQ(density.getenum_DensityStatus(), DensityType::e_Status_DIN_NB);
+    EXPECT_EQ(density.set_DensityStatus(L"status_a"), 38);
+    EXPECT_EQ(density.get_DensityStatus(), L"Status_DIN-NB");
+    EXPECT_FALSE(density.setenum_DensityStatus(DensityType::Eenum_DensityStatus(0)));
+    EXPECT_FALSE(density.setenum_DensityStatus(DensityType::Eenum_DensityStatus(13)));
+    EXPECT_TRUE(density.setenum_DensityStatus(DensityType::Eenum_DensityStatus(1)));
+    EXPECT_EQ(density.get_DensityStatus(), L"Status_A");
+    // Three members of one class share their literals.
+    ToleranceType tolerance;
+    EXPECT_TRUE(tolerance.setenum_SecondaryIlluminant(ToleranceType::e_SecondaryIlluminant_Illuminant_D65));
+    EXPECT_EQ(tolerance.get_SecondaryIlluminant(), L"Illuminant_D65");
+    EXPECT_EQ(tolerance.getenum_PrimaryIlluminant(), 0) << "nothing stored is no literal";
+}
+
+TEST(accessors, optional_and_defaulted_members) {
+    ColorSpaceRGBType rgb;
+    rgb.set_Alpha(0.5);
+    rgb.unset_Alpha();
+    EXPECT_FALSE(rgb.isset_Alpha());
+    EXPECT_EQ(rgb.get_Alpha(), 0.5) << "the value stays";
+
+    FloatingPointValueType axis;
+    EXPECT_EQ(axis.get_AxisNominalScale(), L"Scale_Linear");
+    EXPECT_FALSE(axis.isset_AxisNominalScale());
+    axis.set_AxisNominalScale(L"Scale_Log");
+    EXPECT_TRUE(axis.isset_AxisNominalScale());
+    axis.unset_AxisNominalScale();
+    EXPECT_EQ(axis.getenum_AxisNominalScale(), FloatingPointValueType::e_Scale_Linear);
+
+    Preamble preamble;
+    std::as_const(preamble).get_Owner();
+    EXPECT_FALSE(preamble.isset_Owner());
+    preamble.get_Owner();
+    EXPECT_TRUE(preamble.isset_Owner()) << "looking through the form that can write is enough";
+}
+
+TEST(accessors, lists) {
+    OwnerType owner;
+    owner.append_Company(L"a");
+    owner.append_Company(L"b");
+    owner.set_Company(5, L"c");
+    owner.insert_Company(10, L"d");
+    owner.insert_Company(0, L"z");
+    owner.set_Company(1, L"A");
+    owner.delete_Company(2);
+    std::wstring all;
+    for (unsigned int i = 0; i < owner.size_Company(); ++i)
+        all += owner.get_Company(i);
+    EXPECT_EQ(all, L"zAcd");
+
+    Person* const fourth = &owner.get_Person(3);
+    EXPECT_EQ(owner.size_Person(), 4u) << "default objects fill the list up";
+    EXPECT_EQ(fourth, &owner.back_Person());
+    owner.back_Person().set_Name(L"last");
+    Person* const last = &owner.back_Person();
+    owner.insert_Person(10);
+    EXPECT_EQ(owner.size_Person(), 5u);
+    EXPECT_EQ(&owner.get_Person(3), last) << "children keep their place while the list grows";
+    owner.insert_Person(0);
+    owner.delete_Person(0);
+    EXPECT_EQ(owner.get_Person(3).get_Name(), L"last");
+    Person other;
+    other.set_Name(L"other");
+    EXPECT_EQ(owner.assign_Person(7, other).get_Name(), L"other");
+    EXPECT_EQ(owner.size_Person(), 8u);
+    owner.clear_Person();
+    EXPECT_EQ(owner.size_Person(), 0u);
+
+    Revision revision;
+    revision.append_any("<b/>");
+    revision.insert_any(0, "<a/>");
+    std::string ns = "?";
+    std::string name = "?";
+    std::string value;
+    revision.get_any(0, &ns, &name, &value);
+    EXPECT_EQ(ns + name + value, "<a/>");
+    revision.get_any(1, nullptr, nullptr, &value);
+    EXPECT_EQ(value, "<b/>");
+}
+
+TEST(accessors, choices) {
+    GeometryChoiceType geometry;
+    EXPECT_EQ(geometry.getchosen(), GeometryChoiceType::chosen_none);
+    EXPECT_FALSE(geometry.is_occurs_ok());
+    geometry.set_Angle(45);
+    EXPECT_EQ(geometry.set_SphereGeometry(L"sphere"), 38);
+    EXPECT_EQ(geometry.getchosen(), 0) << "the option is chosen before the value is checked";
+    EXPECT_TRUE(geometry.get_SphereGeometry().empty());
+    EXPECT_EQ(geometry.get_Angle(), 0) << "what was held is gone";
+    EXPECT_EQ(geometry.set_SphereGeometry(L"Sphere_Included"), 0);
+    EXPECT_EQ(geometry.set_SphereGeometry(L"sphere"), 38);
+    EXPECT_EQ(geometry.get_SphereGeometry(), L"Sphere_Included");
+    EXPECT_EQ(geometry.set_UnknownGeometry(L""), 20);
+    EXPECT_EQ(geometry.getchosen(), 2);
+
+    AxisValueChoice axis;
+    axis.get_AxisFloatingPointValue().set_FloatingPointValueType(7);
+    const AxisValueChoice copy(axis);
+    axis.set_AxisStringValue(L"x");
+    EXPECT_EQ(copy.get_AxisFloatingPointValue().get_FloatingPointValueType(), 7);
+    EXPECT_EQ(axis.getchosen(), 1);
+}
+
+TEST(accessors, groups) {
+    sg_Sample sample;
+    EXPECT_EQ(sample.getchosen(), 3);
+    sample.get_SampleSpot().get_Specification().set_SampleWidth(2);
+    auto copy = std::make_unique<sg_Sample>(sample);
+    sample.get_SampleTarget();
+    EXPECT_EQ(sample.getchosen(), sg_Sample::chosen_SampleTarget);
+    sample = *copy;
+    copy.reset();
+    EXPECT_EQ(std::as_const(sample).get_SampleSpot().get_Specification().get_SampleWidth(), 2);
+
+    sg_Function function;
+    auto* const de94 = new FunctionDE94Type;
+    for (const auto set :
+         {&FunctionDE94Type::set_Param_l, &FunctionDE94Type::set_Param_c, &FunctionDE94Type::set_Param_h})
+        (de94->*set)(1);
+    EXPECT_EQ(&function.assign_Function(de94), de94);
+    EXPECT_EQ(function.getchosen(), 0);
+    const sg_Function second(function);
+    EXPECT_STREQ(second.get_Function().getid(), "FunctionDE94Type") << "a copy is of the object's own class";
+    EXPECT_TRUE(hqf::equal(function, second));
+    de94->set_Param_l(2);
+    EXPECT_FALSE(hqf::equal(function, second));
+    function.assign_Function(static_cast<FunctionType*>(nullptr));
+    EXPECT_EQ(function.getchosen(), 0);
+    EXPECT_FALSE(hqf::equal(function, second));
+}
+
+TEST(accessors, identities_and_factories) {
+    const ColorSpaceCIELab element;
+    EXPECT_EQ(element.getid(), ColorSpaceCIELabType::id);
+    EXPECT_TRUE(element.has_id(ColorSpaceCIELabType::id));
+    EXPECT_TRUE(element.has_id(ColorSpaceType::id));
+    const std::string same_text = "ColorSpaceCIELabType";
+    EXPECT_FALSE(element.has_id(same_text.c_str())) << "identities are pointers";
+    EXPECT_FALSE(element.has_id(SubstrateType::id));
+
+    const struct {
+        const void* made;
+        bool expected;
+        const char* what;
+    } rows[] = {
+        {std::unique_ptr<ColorSpaceType>(ColorSpaceType::factory(1000, "ColorSpaceMunsellType")).get(), true, "a form"},
+        {std::unique_ptr<ColorSpaceType>(ColorSpaceType::factory(1000, "ColorSpaceType")).get(), false, "the root"},
+        {std::unique_ptr<ColorSpaceType>(ColorSpaceType::factory(1001, "ColorSpaceMunsellType")).get(), false,
+         "a namespace"},
+        {std::unique_ptr<FunctionType>(FunctionType::factory(1000, "FunctionDEcmcType")).get(), true, "other letters"},
+        {std::unique_ptr<FunctionType>(FunctionType::factory(1000, "FunctionType")).get(), false, "the head"},
+        {std::unique_ptr<ColorSpaceSpecificationSpectrumType>(
+             ColorSpaceSpecificationSpectrumType::factory(1000, "ColorSpaceSpecificationSpectrumType"))
+             .get(),
+         true, "a branch knows itself"},
+        {std::unique_ptr<ColorSpaceSpecificationSpectrumType>(
+             ColorSpaceSpecificationSpectrumType::factory(1000, "ColorSpaceSpecificationEmissiveType"))
+             .get(),
+         false, "and not the other"},
+    };
+    for (const auto& row : rows)
+        EXPECT_EQ(row.made != nullptr, row.expected) << row.what;
+}
+
+TEST(accessors, copies_count_as_set) {
+    const Header empty;
+    const Header copy(empty);
+    EXPECT_FALSE(copy.is_occurs_ok()) << "the list still lacks its minimum";
+    const DeviceType device{DeviceType()};
+    EXPECT_FALSE(device.is_occurs_ok()) << "no copy is made of a temporary";
+    const DeviceType source;
+    EXPECT_TRUE(DeviceType(source).is_occurs_ok());
+    EXPECT_FALSE(DeviceType(source).isset_DeviceClass());
+
+    DeviceFilter filter;
+    filter.set_DeviceFilterType(L"Filter_None");
+    filter.set_CustomOrPartial(L"x");
+    filter.setnil_DeviceFilter();
+    const DeviceFilter nil(filter);
+    EXPECT_TRUE(nil.isnil_DeviceFilter());
+    EXPECT_FALSE(nil.isset_CustomOrPartial()) << "of a nil object nothing else is taken";
+    EXPECT_TRUE(nil.get_DeviceFilterType().empty());
+    filter.set_DeviceFilterType(L"Filter_UVD65");
+    EXPECT_TRUE(filter.isnil_DeviceFilter()) << "the base's setter knows no flag";
+
+    SDKVersion version;
+    version.setnil_SDKVersion();
+    EXPECT_TRUE(version.is_occurs_ok());
+    version.set_SDKVersion(L"2");
+    EXPECT_FALSE(version.isnil_SDKVersion());
+}
+
+TEST(accessors, swap_reset_and_equality) {
+    ColorType made;
+    made.set_ColorName(L"a");
+    made.append_ColorSpace();
+    made.back_ColorSpace().get_ColorSpaceCIELab().set_L(1);
+    made.get_Substrate().get_SubstratePaper().get_Color().set_ColorName(L"paper");
+    ColorType a(made);
+    ColorType b(a);
+    EXPECT_FALSE(hqf::equal(made, a)) << "in a copy what is mandatory counts as set";
+    EXPECT_TRUE(hqf::equal(a, b));
+    b.get_Substrate().get_SubstratePaper().get_Color().set_ColorName(L"metal");
+    EXPECT_FALSE(hqf::equal(a, b)) << "a difference three objects down";
+    b = a;
+    b.back_ColorSpace().get_ColorSpaceCIELab().set_A(-0.0);
+    a.back_ColorSpace().get_ColorSpaceCIELab().set_A(0.0);
+    EXPECT_FALSE(hqf::equal(a, b)) << "the sign of zero";
+    ColorType c;
+    c.swap(a);
+    EXPECT_EQ(c.get_ColorName(), L"a");
+    EXPECT_TRUE(hqf::equal(a, ColorType()));
+    c.reset();
+    EXPECT_TRUE(hqf::equal(c, a));
+}
+
+/// A class of the application that asks the pieces of its base.
+class my_colour : public ColorType {
+public:
+    using ColorType::marshal_attributes;
+    using ColorType::marshal_child_elements;
+};
+
+TEST(accessors, pieces_for_derived_classes) {
+    my_colour colour;
+    colour.set_ColorName(L"<x>");
+    colour.append_ChangeHistory("2024-01-01T00:00:00Z");
+    std::ostringstream stream;
+    lmx::c_xml_writer writer(stream, "\t", "\n");
+    colour.marshal_attributes(writer);
+    EXPECT_EQ(colour.marshal_child_elements(writer), 0);
+    EXPECT_EQ(stream.str(), " ColorName=\"&lt;x>\"<Hqf:ChangeHistory>2024-01-01T00:00:00Z</Hqf:ChangeHistory>\n");
+}
+
+} // namespace
