@@ -2,6 +2,8 @@
 /// them, options and group members that are chosen by it.
 #pragma once
 
+#include <atomic>
+#include <memory>
 #include <string>
 
 #include "hqf/frame/checks.h"
@@ -35,6 +37,20 @@ model_class& made(child_pointer<model_class>& member) {
     if (member.object == nullptr) member.object = new model_class;
     member.present = true;
     return *member.get();
+}
+
+/// The same object for a caller that only looks: made if it isn't there, so that its address never changes, but not marked
+/// present. Two threads may look at one object at a time.
+template <class model_class>
+const model_class& made_to_look_at(const child_pointer<model_class>& member) {
+    // The pointer is the one thing that looking may change.
+    const std::atomic_ref<void*> object(const_cast<void*&>(member.object));
+    void* held = object.load(std::memory_order_acquire);
+    if (held == nullptr) {
+        auto fresh = std::make_unique<model_class>();
+        if (object.compare_exchange_strong(held, fresh.get(), std::memory_order_acq_rel)) held = fresh.release();
+    }
+    return *static_cast<const model_class*>(held);
 }
 
 /// The value of an option; an empty one while another is chosen.

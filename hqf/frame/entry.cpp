@@ -2,7 +2,8 @@
 
 #include <cstdio>
 #include <fstream>
-#include <sstream>
+
+#include "hqf/xml_out/text_stream.h"
 
 namespace hqf::frame {
 
@@ -17,9 +18,9 @@ lmx::elmx_error write_file(const char* file_name, void* object, const char* name
 }
 
 lmx::elmx_error write_string(std::string* out, void* object, const char* name, write_call write) {
-    std::ostringstream stream;
+    text_stream stream;
     const lmx::elmx_error error = write_stream(stream, object, name, write);
-    if (error == lmx::err_no_error) *out = std::move(stream).str();
+    if (error == lmx::err_no_error) out->assign(stream.text());
     return error;
 }
 

@@ -16,7 +16,7 @@ public:
     list_base& operator=(const list_base&) = delete;
 
     unsigned int size() const { return size_; }
-    void* item(unsigned int index) const { return items_[index]; }
+    void* item(unsigned int index) const { return items()[index]; }
 
     /// Makes room for one more pointer, so that the append that follows cannot fail.
     ///
@@ -26,47 +26,57 @@ public:
     }
 
     /// Takes over an object. make_room() came first.
-    void append(void* object) { items_[size_++] = object; }
+    void append(void* object) { items()[size_++] = object; }
 
     /// Takes over an object in front of the one at `index`, or at the end for an index from the size up.
     void insert(unsigned int index, void* object) {
         append(object);
         for (unsigned int at = size_ - 1; at > index; --at)
-            std::swap(items_[at], items_[at - 1]);
+            std::swap(items()[at], items()[at - 1]);
     }
 
     /// Gives up the last object, which the caller owns then.
-    void* take_back() { return items_[--size_]; }
+    void* take_back() { return items()[--size_]; }
 
     /// Gives up the object at `index` and closes the gap.
     void* take(unsigned int index) {
         for (unsigned int at = index + 1; at < size_; ++at)
-            std::swap(items_[at], items_[at - 1]);
+            std::swap(items()[at], items()[at - 1]);
         return take_back();
     }
 
     void swap(list_base& other) noexcept {
-        std::swap(items_, other.items_);
+        std::swap(place_, other.place_);
         std::swap(size_, other.size_);
         std::swap(capacity_, other.capacity_);
     }
 
 protected:
-    ~list_base() { std::free(items_); }
+    ~list_base() {
+        if (has_block()) std::free(place_);
+    }
 
 private:
+    /// Most lists have one item: its pointer lies in the list itself, a longer list's in a block.
+    static constexpr unsigned int in_place = 1;
+
+    bool has_block() const { return capacity_ > in_place; }
+    void** items() const { return has_block() ? static_cast<void**>(place_) : const_cast<void**>(&place_); }
+
     void grow() {
-        const unsigned int capacity = capacity_ == 0 ? 1 : capacity_ * 2;
+        const unsigned int capacity = capacity_ * 2;
         if (capacity <= capacity_) throw std::bad_alloc();
-        void* items = std::realloc(items_, sizeof(void*) * capacity);
-        if (items == nullptr) throw std::bad_alloc();
-        items_ = static_cast<void**>(items);
+        void* const block = std::realloc(has_block() ? place_ : nullptr, sizeof(void*) * capacity);
+        if (block == nullptr) throw std::bad_alloc();
+        if (!has_block()) *static_cast<void**>(block) = place_;
+        place_ = block;
         capacity_ = capacity;
     }
 
-    void** items_ = nullptr;
+    /// The block of pointers, or the one pointer.
+    void* place_ = nullptr;
     unsigned int size_ = 0;
-    unsigned int capacity_ = 0;
+    unsigned int capacity_ = in_place;
 };
 
 template<class item_type>

@@ -53,7 +53,8 @@ struct pointer_member {
     bool present = false;
 };
 
-/// A complex child on the heap, made when someone asks for it: the only way for a class to contain its own kind.
+/// A complex child on the heap, made when someone asks for it: the only way for a class to contain its own kind, and
+/// cheaper than an object for every child that might have been there.
 template<class model_class>
 struct child_pointer : pointer_member {
     ~child_pointer() { delete get(); }

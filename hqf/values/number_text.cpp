@@ -1,5 +1,6 @@
 #include "hqf/values/number_text.h"
 
+#include <array>
 #include <charconv>
 #include <cmath>
 #include <cstdint>
@@ -26,28 +27,70 @@ const char* name_of(number value) {
     return nullptr;
 }
 
+/// The digits of the numbers from 00 to 99.
+constexpr auto digit_pairs = [] {
+    std::array<char, 200> pairs{};
+    for (int i = 0; i < 100; ++i) {
+        pairs[static_cast<std::size_t>(2 * i)] = static_cast<char>('0' + i / 10);
+        pairs[static_cast<std::size_t>(2 * i + 1)] = static_cast<char>('0' + i % 10);
+    }
+    return pairs;
+}();
+
+char* put_pair(char* out, std::uint64_t value) {
+    std::memcpy(out, digit_pairs.data() + 2 * value, 2);
+    return out + 2;
+}
+
 char* put_digits(char* out, std::uint64_t value) {
+    if (value < 10) {
+        *out = static_cast<char>('0' + value);
+        return out + 1;
+    }
+    if (value < 100) return put_pair(out, value);
     return std::to_chars(out, out + 20, value).ptr;
 }
 
-/// Writes the decimal fraction `scaled` / 10^`decimals`, without zeros at its end.
-char* put_decimal(char* out, std::uint64_t scaled, int decimals) {
-    while (decimals > 0 && scaled % 10 == 0) {
-        scaled /= 10;
-        --decimals;
+/// Writes exactly `count` digits.
+template<int count>
+char* put_fixed_digits(char* out, std::uint64_t value) {
+    if constexpr (count % 2 == 1) {
+        constexpr std::uint64_t first = count == 1 ? 1 : count == 3 ? 100 : 10000;
+        *out = static_cast<char>('0' + value / first);
+        return put_fixed_digits<count - 1>(out + 1, value % first);
+    } else {
+        for (int i = count - 2; i >= 0; i -= 2) {
+            put_pair(out + i, value % 100);
+            value /= 100;
+        }
+        return out + count;
     }
-    char digits[20];
-    const auto count = static_cast<int>(put_digits(digits, scaled) - digits);
-    const int whole = count > decimals ? count - decimals : 0;
-    if (whole == 0) *out++ = '0';
-    std::memcpy(out, digits, static_cast<std::size_t>(whole));
-    out += whole;
-    if (decimals == 0) return out;
+}
+
+/// Writes the decimal fraction `scaled` / `power`, which is ten to the power `decimals`, without zeros at its end.
+template<int decimals, std::uint64_t power>
+char* put_decimal(char* out, std::uint64_t scaled) {
+    out = put_digits(out, scaled / power);
+    const std::uint64_t fraction = scaled % power;
+    if (fraction == 0) return out;
     *out++ = '.';
-    for (int zeros = decimals - (count - whole); zeros > 0; --zeros)
-        *out++ = '0';
-    std::memcpy(out, digits + whole, static_cast<std::size_t>(count - whole));
-    return out + (count - whole);
+    out = put_fixed_digits<decimals>(out, fraction);
+    while (out[-1] == '0')
+        --out;
+    return out;
+}
+
+/// Writes `value` if it is the nearest double to a decimal with so many places; gives null if not.
+template<int decimals, std::uint64_t power>
+char* put_with_decimals(char* out, double value) {
+    constexpr double most_digits = 1e14;
+    constexpr auto scale = static_cast<double>(power);
+    const double scaled = value * scale + 0.5;
+    if (!(scaled < most_digits)) return nullptr;
+    const auto whole = static_cast<std::int64_t>(scaled);
+    return static_cast<double>(whole) / scale == value
+               ? put_decimal<decimals, power>(out, static_cast<std::uint64_t>(whole))
+               : nullptr;
 }
 
 /// Writes a positive number that is the nearest double to a decimal of at most 14 digits; gives null for any other.
@@ -57,20 +100,11 @@ char* put_decimal(char* out, std::uint64_t scaled, int decimals) {
 /// operands are exact, so its result is the nearest double to their quotient.
 char* put_short_decimal(char* out, double value) {
     constexpr double smallest = 1e-4; // the general format turns to exponents below this
-    constexpr double most_digits = 1e14;
-    constexpr struct {
-        int decimals;
-        double power;
-    } scales[] = {{3, 1e3}, {6, 1e6}, {10, 1e10}};
     if (value < smallest) return nullptr;
-    for (const auto& scale : scales) {
-        const double scaled = value * scale.power + 0.5;
-        if (!(scaled < most_digits)) break;
-        const auto whole = static_cast<std::int64_t>(scaled);
-        if (static_cast<double>(whole) / scale.power == value)
-            return put_decimal(out, static_cast<std::uint64_t>(whole), scale.decimals);
-    }
-    return nullptr;
+    char* end = put_with_decimals<4, 10000>(out, value);
+    if (end == nullptr) end = put_with_decimals<6, 1000000>(out, value);
+    if (end == nullptr) end = put_with_decimals<10, 10000000000>(out, value);
+    return end;
 }
 
 } // namespace

@@ -107,8 +107,8 @@ const char* skip_space(const char* from, const char* stop) {
     for (; at < stop; at += 16) {
         const __m128i bytes = load(at);
         // Bytes above ASCII are negative as signed numbers: no space either.
-        const auto above = static_cast<unsigned>(
-            _mm_movemask_epi8(_mm_or_si128(_mm_cmpgt_epi8(bytes, _mm_set1_epi8(' ')), bytes)));
+        const auto above =
+            static_cast<unsigned>(_mm_movemask_epi8(_mm_or_si128(_mm_cmpgt_epi8(bytes, _mm_set1_epi8(' ')), bytes)));
         if (above != 0) {
             at += std::countr_zero(above);
             break;

@@ -3,7 +3,6 @@
 #include <cstddef>
 #include <string>
 #include <string_view>
-#include <vector>
 
 namespace lmx {
 
@@ -16,7 +15,7 @@ public:
 private:
     friend class c_string_stack_node;
 
-    std::vector<char> bytes_;
+    std::string bytes_;
 };
 
 /// Keeps a name on the stack for a scope. Nodes end in reverse order of their start.
@@ -25,7 +24,7 @@ public:
     c_string_stack_node(c_string_stack& stack, std::string_view name)
         : stack_(stack)
         , offset_(stack.bytes_.size()) {
-        stack.bytes_.insert(stack.bytes_.end(), name.begin(), name.end());
+        stack.bytes_.append(name);
         stack.bytes_.push_back('\0');
     }
     c_string_stack_node(const c_string_stack_node&) = delete;

@@ -15,8 +15,8 @@
 
 namespace hqf {
 
-/// What the general path would remember of the bytes that the fast path has read: the last name and the white-space mode
-/// of the last value. Written down when the general path goes on.
+/// What the general path would remember of the bytes that the fast path has read: the last name and the white-space
+/// mode of the last value. Written down when the general path goes on.
 struct fast_trace {
     enum class name_kind : unsigned char { none, element, attribute, xsi };
 

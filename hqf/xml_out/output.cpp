@@ -17,17 +17,37 @@ output::output(lmx::c_xml_writer& writer)
     , tab_length_(std::strlen(tab_))
     , newline_length_(std::strlen(newline_))
     , plain_(typeid(writer) == typeid(lmx::c_xml_writer))
-    , standard_numbers_(has_default_format(stream_)) {}
+    , standard_numbers_(has_default_format(stream_))
+    , memory_(stream_.good() ? dynamic_cast<text_buffer*>(stream_.rdbuf()) : nullptr) {
+    take_room();
+}
+
+/// Starts to gather behind what the stream holds.
+void output::take_room() {
+    begin_ = memory_ == nullptr ? block_ : memory_->room(most_at_once);
+    end_ = memory_ == nullptr ? block_ + sizeof(block_) : memory_->room_end();
+    at_ = begin_;
+}
 
 void output::flush() {
-    if (at_ == block_) return;
-    const std::streamsize size = at_ - block_;
-    at_ = block_;
-    stream_.write(block_, size);
+    if (at_ == begin_) return;
+    const char* const end = at_;
+    at_ = begin_;
+    if (memory_ != nullptr)
+        memory_->advance(end);
+    else
+        stream_.write(begin_, end - begin_);
+    // Others may write before we do again, so room that is theirs as well is asked for anew.
+    if (memory_ != nullptr) begin_ = at_ = end_ = nullptr;
+}
+
+void output::make_room() {
+    flush();
+    take_room();
 }
 
 void output::text(const char* data, std::size_t size) {
-    if (size > sizeof(block_) / 2) {
+    if (size > most_at_once) {
         flush();
         stream_.write(data, static_cast<std::streamsize>(size));
         return;
@@ -58,7 +78,7 @@ void output::value(const std::wstring& text) {
     const wchar_t* const end = next + text.size();
     while (next != end) {
         reserve(escaped_size);
-        at_ = write_xml_escaped(at_, block_ + sizeof(block_), next, end);
+        at_ = write_xml_escaped(at_, end_, next, end);
     }
 }
 

@@ -10,6 +10,7 @@
 #include "hqf/values/c_binary.h"
 #include "hqf/values/c_datetime.h"
 #include "hqf/xml_out/c_xml_writer.h"
+#include "hqf/xml_out/text_stream.h"
 
 namespace hqf {
 
@@ -30,6 +31,8 @@ class output {
 public:
     /// Longest text that may be appended in whole 16-byte blocks.
     static constexpr std::size_t longest_tag = 80;
+    /// A longer text goes straight to the stream.
+    static constexpr std::size_t most_at_once = 8 * 1024;
 
     explicit output(lmx::c_xml_writer& writer);
     output(const output&) = delete;
@@ -85,8 +88,10 @@ public:
 
 private:
     void reserve(std::size_t size) {
-        if (static_cast<std::size_t>(block_ + sizeof(block_) - at_) < size) flush();
+        if (static_cast<std::size_t>(end_ - at_) < size) make_room();
     }
+    void make_room();
+    void take_room();
     void indent_slowly();
     void indent_through_writer();
     void line_end_through_writer();
@@ -101,7 +106,12 @@ private:
     const bool plain_;
     /// The stream is in the state that a new one has, so numbers needn't go through it.
     const bool standard_numbers_;
-    char* at_ = block_;
+    /// The stream's own memory, where it is one of ours: then text is gathered in it and not copied at all.
+    text_buffer* const memory_;
+    /// What is gathered lies from begin_ to at_.
+    char* begin_;
+    char* at_;
+    char* end_;
     char block_[16 * 1024];
 };
 

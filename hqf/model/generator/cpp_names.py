@@ -82,6 +82,12 @@ def is_virtual(cls: ModelClass) -> bool:
     return cls.polymorphic
 
 
+def made_on_first_use(member: Member) -> bool:
+    """Whether a single child lies on the heap: where it must, since its class can contain its own kind, and wherever it
+    may be absent, which most such children are in most documents."""
+    return member.by_pointer or (not member.minimum and not member.always_written)
+
+
 def enumerations(cls: ModelClass) -> list[tuple[str, SimpleType]]:
     """The enumerated members that a class declares itself, with the name that their enumeration takes."""
     found = [(place.name, place.type) for place in [*cls.attributes, *cls.members, *cls.options]]

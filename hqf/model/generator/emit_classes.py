@@ -2,7 +2,7 @@
 
 from __future__ import annotations
 
-from cpp_names import (NOTICE, argument_type, literals_name, rows_name, rules_pointer)
+from cpp_names import (NOTICE, argument_type, literals_name, made_on_first_use, rows_name, rules_pointer)
 from vocabulary import Body, Member, ModelClass, SimpleType, Vocabulary
 
 ERROR = "lmx::elmx_error"
@@ -141,7 +141,7 @@ class _Bodies:
             self.list_accessors(member)
         elif member.kind == "simple":
             self.value(member.name, f"{member.name}_", member.type, not member.minimum)
-        elif member.by_pointer:
+        elif made_on_first_use(member):
             self.pointer_accessors(member)
         else:
             self.child_accessors(member)
@@ -190,7 +190,7 @@ class _Bodies:
     def pointer_accessors(self, member: Member) -> None:
         name, item, stored = member.name, member.class_name, f"{member.name}_"
         self.define(f"{item}&", f"get_{name}()", f"return frame::made({stored});")
-        self.define(f"const {item}&", f"get_{name}()", f"return frame::object_or_empty({stored}.get());", const=True)
+        self.define(f"const {item}&", f"get_{name}()", f"return frame::made_to_look_at({stored});", const=True)
         self.child_tail(member, stored)
 
     def child_tail(self, member: Member, stored: str) -> None:

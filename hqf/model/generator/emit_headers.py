@@ -4,7 +4,8 @@ from __future__ import annotations
 
 import textwrap
 
-from cpp_names import (NOTICE, argument_type, bounds_text, enumerations, identifier, is_virtual, value_type)
+from cpp_names import (NOTICE, argument_type, bounds_text, enumerations, identifier, is_virtual, made_on_first_use,
+                       value_type)
 from vocabulary import Attribute, Body, Member, ModelClass, SimpleType, Vocabulary
 
 
@@ -302,7 +303,7 @@ class _Header:
             self.add(f"bool isset_{name}() const;")
             self.doc("Clears the flag; the object stays.")
             self.add(f"void unset_{name}();")
-        kind = "child_pointer" if member.by_pointer else "child"
+        kind = "child_pointer" if made_on_first_use(member) else "child"
         self.storage.append(f"hqf::frame::{kind}<{item}> {name}_;")
 
     def wildcard(self, member: Member) -> None:
