@@ -1,14 +1,17 @@
 /// Load and write operations of the root class.
 
+#include <cwchar>
 #include <fstream>
-#include <sstream>
 
 #include "hqf/document/SdkInformationStamper.h"
 #include "hqf/document/XMLDocumentResult.h"
+#include "hqf/document/archive.h"
 #include "hqf/frame/entry.h"
 #include "hqf/model/Hqf.h"
 #include "hqf/platform/paths.h"
 #include "hqf/values/text.h"
+#include "hqf/values/transcode.h"
+#include "hqf/xml_out/text_stream.h"
 
 namespace hqf_v2 {
 
@@ -42,7 +45,7 @@ lmx::elmx_error writeXmlFile(Hqf& document, const std::wstring& path) {
 } // namespace
 
 lmx::elmx_error Hqf::loadFile(const std::wstring& path) {
-    if (hasSuffix(path, archive_suffix)) return lmx::err_user_defined_error_1;
+    if (hasSuffix(path, archive_suffix)) return load_archive(*this, path);
     lmx::c_xml_reader_file reader(path.c_str());
     return reader.is_open() ? unmarshal(reader) : lmx::err_unable_to_open_file;
 }
@@ -54,19 +57,23 @@ lmx::elmx_error Hqf::loadString(const std::wstring& xml) {
 }
 
 lmx::elmx_error Hqf::writeFile(const std::wstring& path) {
-    if (hasSuffix(path, archive_suffix)) return lmx::err_user_defined_error_1;
-    if (!hasSuffix(path, plain_suffix)) return lmx::err_user_defined_error_2;
-    return writeXmlFile(*this, path);
+    if (hasSuffix(path, archive_suffix)) {
+        // The archive is packed from the plain file, which lies beside it for that time.
+        const std::wstring xml_path = path.substr(0, path.size() - std::wcslen(archive_suffix)) + plain_suffix;
+        const lmx::elmx_error error = writeXmlFile(*this, xml_path);
+        return error != lmx::err_no_error ? error : pack_archive(path, xml_path);
+    }
+    return hasSuffix(path, plain_suffix) ? writeXmlFile(*this, path) : lmx::err_user_defined_error_2;
 }
 
 XMLDocumentResult Hqf::writeString() {
-    std::ostringstream stream;
+    hqf::text_stream stream;
     lmx::c_xml_writer writer(stream, lmx::c_xml_writer::include_xml_decl, hqf::frame::layout_tab,
                              hqf::frame::layout_newline);
     SdkInformationStamper().stampWrite(*this);
     const lmx::elmx_error error = marshal(writer, root_name);
     std::wstring text;
-    if (error == lmx::err_no_error) lmx::convert(&text, std::move(stream).str());
+    if (error == lmx::err_no_error) hqf::assign_wide(text, stream.text().data(), stream.text().size());
     return XMLDocumentResult(std::move(text), error);
 }
 

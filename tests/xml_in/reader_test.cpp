@@ -1,0 +1,361 @@
+#include "support.h"
+
+#include "hqf/values/s_ns_map.h"
+#include "hqf/xml_in/c_known_elements_selector.h"
+#include "hqf/xml_in/c_xml_reader_file.h"
+#include "hqf/xml_in/c_xml_reader_local.h"
+#include "hqf/xml_in/c_xml_reader_memory.h"
+#include "hqf/xml_in/must_understand.h"
+
+#include <gtest/gtest.h>
+
+namespace {
+
+using namespace xml_in_test;
+
+const lmx::s_ns_map format[] = {{1000, "f", "urn:f"}, {0, nullptr, nullptr}};
+const lmx::s_event_map names[] = {
+    {1000, "root", 4, 12}, {1000, "item", 4, 13}, {1, "item", 4, 14}, {1, "size", 4, 15},
+    {1000, "item", 4, 99}, {5, "type", 4, 98},    {0, nullptr, 0, 1},
+};
+const std::string xsi = " xmlns:xsi='http://www.w3.org/2001/XMLSchema-instance'";
+
+class memory_reader : public lmx::c_xml_reader_memory {
+public:
+    explicit memory_reader(const std::string& text)
+        : c_xml_reader_memory(text.data(), static_cast<unsigned int>(text.size())) {
+        set_ns_map(format);
+    }
+};
+
+// Walks a document the way the model's classes do, one scope a level, and writes events and namespace numbers down.
+std::string walk(lmx::c_xml_reader& reader) {
+    lmx::c_xml_reader_local scope(&reader);
+    std::string out;
+    for (;;) {
+        lmx::elmx_error error = lmx::err_no_error;
+        reader.get_element_event(names, &error, &reader.item_name);
+        out += std::to_string(reader.get_current_event());
+        if (error != 0) out += "(" + std::to_string(error) + ")";
+        if (!reader.is_current_event_tokenisable()) return out;
+        out += "#" + std::to_string(reader.get_element_ns_id()) + reader.get_local_name();
+        std::string attribute;
+        while (reader.get_attribute_event(names, &error, &attribute)) {
+            out += " " + std::to_string(reader.get_current_event()) + attribute;
+            if (error != 0) return out + "(" + std::to_string(error) + ")";
+            reader.skip_attribute_value();
+        }
+        if (reader.get_current_event() == lmx::EXE_START_TAG_END) out += "[" + walk(reader) + "]";
+        out += " ";
+    }
+}
+
+TEST(reader, turns_names_into_events) {
+    const struct {
+        std::string text;
+        const char* events;
+        const char* why;
+    } rows[] = {
+        {"<p:root xmlns:p='urn:f'><p:item/></p:root>", "12#1000root[13#1000item 6] 0(34)", "the number decides"},
+        {"<root xmlns='urn:f'><item size='1'/></root>", "12#1000root[13#1000item 15size 6] 0(34)",
+         "a default namespace serves elements, not attributes"},
+        {"<root xmlns='urn:f'><item xmlns=''/><item/></root>", "12#1000root[14#1item 13#1000item 6] 0(34)",
+         "switched off for one child alone"},
+        {"<item/>", "14#1item 0(34)", "no namespace at all"},
+        {"<q:item q:size='1'/>", "1#0item 1q:size 0(34)", "an undeclared prefix"},
+        {"<p:it xmlns:p='urn:f'/>", "1#1000it 0(34)", "a name that is only the start of a row's"},
+        {"<r><p:item xmlns:p='urn:f'/><p:item/></r>", "1#1r[13#1000item 1#0item 6] 0(34)",
+         "a sibling's declaration is gone"},
+        {"<r xmlns:p='urn:f'><p:item><p:item xmlns:p='u'/><p:item/></p:item></r>",
+         "1#1r[13#1000item[1#1001item 13#1000item 6] 6] 0(34)", "the nearest declaration wins"},
+        {"<r" + xsi + " xsi:type='' xsi:nil='' xsi:schemaLocation='' xsi:noNamespaceSchemaLocation='' xsi:x=''/>",
+         "1#1r 8xsi:type 9xsi:nil 10xsi:schemaLocation 11xsi:noNamespaceSchemaLocation 1xsi:x 0(34)",
+         "the table is not asked about instance attributes"},
+        {"<xml:item/>", "1#2item 0(34)", "the prefix xml is always declared"},
+        {"<item>text</item>", "14#1item[5] 6", "text is no name"},
+        {"<item></", "14#1item[3] 0(34)", "a failure without a report has no code"},
+        {"<item>< >", "14#1item[3(23)] 0(34)", "one with a report has its code"},
+        {"<item a='1' !>", "14#1item 1a 3(23)", "in the attribute loop too"},
+        {"", "0(34)", "an empty document"},
+    };
+    for (const auto& row : rows) {
+        memory_reader reader(row.text);
+        std::string events = walk(reader);
+        EXPECT_EQ(events, row.events) << row.why;
+    }
+}
+
+TEST(reader, namespaces) {
+    const std::string text = "<p:a xmlns:p='urn:f' xmlns:q='urn:q' xmlns='urn:d' xmlns:n=''/>";
+    memory_reader reader(text);
+    reader.set_ns_map(format);
+    reader.add_namespace_mapping("m", "urn:m");
+    reader.add_default_namespace_mapping("urn:default");
+    EXPECT_EQ(reader.get_namespace("m:x", &reader.value_buffer), " ") << "mappings wait for set_ns_map";
+    reader.set_ns_map(format);
+    lmx::c_xml_reader_local scope(&reader);
+    EXPECT_EQ(reader.get_namespace("x", &reader.value_buffer), "urn:default");
+    lmx::elmx_error error = lmx::err_no_error;
+    reader.get_element_event(nullptr, &error, &reader.item_name);
+    EXPECT_EQ(reader.get_current_event(), lmx::EXE_NAME) << "no table, no look-up";
+    const struct {
+        const char* qname;
+        const char* uri;
+        bool is_valid;
+    } rows[] = {
+        {"p:x", "urn:f", true},
+        {"x", "urn:d", true},
+        {"m:x", "urn:m", true},
+        {"s:x", " ", false},
+        {"n:x", "", true},
+        {"p:", "urn:f", false},
+        {"p:1", "urn:f", false},
+        {"p:\xC3\xA9", "urn:f", false},
+        {"p:_-.9", "urn:f", true},
+        {"p::x", "urn:f", true},
+        {":x", "urn:d", false},
+        {"p:x y", "urn:f", false},
+        {"xml:x", "http://www.w3.org/XML/1998/namespace", true},
+    };
+    for (const auto& row : rows) {
+        EXPECT_EQ(reader.get_namespace(row.qname, &reader.value_buffer), row.uri) << row.qname;
+        EXPECT_EQ(reader.is_valid_qname(row.qname), row.is_valid) << row.qname;
+    }
+    EXPECT_EQ(reader.find_enumerated_namespace("urn:m"), 1001) << "after the table's own 1000";
+    EXPECT_EQ(reader.find_enumerated_namespace("urn:none"), 0);
+    EXPECT_EQ(reader.find_namespace_from_id(7), nullptr);
+}
+
+TEST(reader, scopes_find_prefixes_and_numbers) {
+    lmx::c_xml_local outer;
+    EXPECT_EQ(outer.find_namespace_id("p"), 0);
+    outer.add_namespace("p", 1000);
+    outer.add_namespace("o", 1001);
+    lmx::c_xml_local middle(outer);
+    lmx::c_xml_local inner(middle);
+    EXPECT_EQ(inner.find_namespace_id("p"), 1000) << "through a scope without declarations";
+    inner.add_namespace("i", 1000);
+    inner.add_namespace("p", 1002);
+    inner.add_namespace("p", 1003);
+    EXPECT_EQ(inner.find_namespace_id("p"), 1003);
+    EXPECT_STREQ(inner.find_namespace_prefix(1000), "i") << "the innermost";
+    EXPECT_STREQ(inner.find_first_namespace_prefix(1000), "p") << "the outermost";
+    EXPECT_STREQ(inner.find_namespace_prefix(2), "xml");
+    EXPECT_EQ(inner.find_namespace_prefix(1002), nullptr);
+    inner.clear();
+    EXPECT_EQ(inner.find_namespace_id("p"), 1000);
+
+    lmx::c_enumerated_namespaces table;
+    EXPECT_EQ(table.find_namespace("http://www.w3.org/2001/XMLSchema-instance"), 5);
+    table.add_namespace("u", 1500);
+    table.add_namespace("u", 1700);
+    EXPECT_EQ(table.find_namespace("u"), 1500) << "a known URI keeps its number";
+    EXPECT_EQ(table.add_namespace("v"), 1701) << "new ones begin above";
+    table.clear();
+    EXPECT_EQ(table.add_namespace("v"), 1000);
+}
+
+TEST(reader, simple_values) {
+    const struct {
+        const char* rest;
+        const char* expected;
+        const char* why;
+    } rows[] = {
+        {" a='1'>v </e>", "v, 0", "attributes are ignored"},
+        {"/>", ", 0, empty", "an empty element"},
+        {"></e>", ", 0", "one without text is not the same"},
+        {"/x>", "!, 11, empty", "a bad start tag"},
+        {">&nope;</e>", "!, 29", "a bad value"},
+        {">v", "!, 29", "or a cut one"},
+        {">v<b/></e>", "!, 10", "a child"},
+        {">v</f>", "!, 10", "another end tag"},
+    };
+    for (const auto& row : rows) {
+        const std::string text = std::string("<e") + row.rest;
+        memory_reader reader(text);
+        lmx::c_xml_reader_local scope(&reader);
+        lmx::elmx_error error = lmx::err_no_error;
+        reader.get_element_event(nullptr, &error, &reader.item_name);
+        bool empty = false;
+        std::string value = "old";
+        const bool is_read = reader.get_simple_type_value(reader.item_name, lmx::collapse, &value, &error, &empty);
+        EXPECT_EQ((is_read ? value : "!") + ", " + std::to_string(error) + (empty ? ", empty" : ""), row.expected)
+            << row.why;
+    }
+}
+
+TEST(reader, values_of_any_content) {
+    const struct {
+        const char* rest;
+        const char* expected;
+    } rows[] = {
+        {"> x<b/>y</e>", " x<b/>y, 0, 6"}, {"/>", ", 0, 7"},      {"/x>", "!, 11, 7"},
+        {"><b></e>", "!, 29, 7"},          {"></f>", "!, 10, 6"},
+    };
+    for (const auto& row : rows) {
+        const std::string text = std::string("<e") + row.rest;
+        memory_reader reader(text);
+        lmx::c_xml_reader_local scope(&reader);
+        lmx::elmx_error error = lmx::err_no_error;
+        reader.get_element_event(nullptr, &error, &reader.item_name);
+        bool empty = false;
+        std::string value = "old";
+        const bool is_read = reader.get_element_ur_value("e", &value, &error, &empty);
+        EXPECT_EQ((is_read ? value : "!") + ", " + std::to_string(error) + ", " +
+                      std::to_string(reader.get_current_event()),
+                  row.expected);
+    }
+}
+
+TEST(reader, passes_unknown_elements_over) {
+    const lmx::s_known_elements known[] = {{1, "known", 5}, {0, nullptr, 0}};
+    const std::string text = "<u><item/></u><v a='1'/><item/><known/><u/>x<known/><w><x></y></w>";
+    memory_reader reader(text);
+    lmx::c_xml_reader_local scope(&reader);
+    lmx::elmx_error error = lmx::err_no_error;
+    const auto next = [&](const lmx::s_event_map* map) {
+        reader.get_known_element_event(map, &error, &reader.item_name);
+        const std::string seen = std::to_string(reader.get_current_event()) + reader.item_name;
+        if (reader.is_current_event_tokenisable()) reader.skip_start_tag(nullptr);
+        return seen + "," + std::to_string(error);
+    };
+    {
+        const lmx::c_known_elements_selector selector(reader, known);
+        EXPECT_EQ(next(names), "14item,0") << "the table's element, behind two unknown ones";
+        EXPECT_EQ(next(names), "1known,0") << "a known element, with no event";
+        EXPECT_EQ(next(names), "5x,0") << "text is not passed over";
+        EXPECT_EQ(next(nullptr), "7known,0") << "without a table";
+    }
+    EXPECT_EQ(reader.get_known_elements(), nullptr) << "the selector puts the old table back";
+    EXPECT_EQ(next(names), "1w,5") << "an element that can't be skipped";
+}
+
+TEST(reader, handles_errors_as_its_user_says) {
+    class lenient : public memory_reader {
+    public:
+        using memory_reader::memory_reader;
+        lmx::elmx_error user_handle_error(lmx::elmx_error code, const std::string& item, const char* file,
+                                          int line) override {
+            seen += item + file + std::to_string(line);
+            return memory_reader::user_handle_error(code, item, file, line);
+        }
+        lmx::elmx_error user_handle_error(lmx::elmx_error code) override {
+            return code == lmx::err_length_too_long ? lmx::err_no_error : code;
+        }
+        std::string seen;
+    };
+    const std::string text = "\n\n\n\n\n\n<a/>";
+    lenient reader(text);
+    lmx::c_xml_reader_local scope(&reader);
+    std::string message;
+    EXPECT_EQ(reader.get_error_message(&message), "No Error");
+    lmx::elmx_error error = lmx::err_no_error;
+    reader.get_element_event(nullptr, &error, &reader.item_name);
+    EXPECT_EQ(reader.handle_error(lmx::err_mandatory_element_missing, "Hqf:L", "Hqf", 3), 21);
+    EXPECT_EQ(reader.seen, "Hqf:LHqf3");
+    EXPECT_EQ(reader.get_error_message(&message), "line:7-'Hqf:L'-Mandatory element missing");
+    EXPECT_EQ(reader.handle_error(static_cast<lmx::elmx_error>(999), "x", "", 0), 999);
+    EXPECT_EQ(reader.get_error_message(&message), "line:7-'x'-");
+    EXPECT_EQ(reader.handle_error(lmx::err_length_too_long, "y", "", 0), 0);
+    EXPECT_EQ(reader.get_error_message(&message), "No Error") << "what the user lets pass is no error";
+    EXPECT_EQ(reader.get_error_item_name(), "y");
+}
+
+TEST(reader, keeps_the_two_records_of_errors_apart) {
+    const std::string text = "\n< >";
+    memory_reader reader(text);
+    lmx::elmx_error_type type{};
+    lmx::elmx_error error = lmx::err_no_error;
+    int line = 0;
+    EXPECT_FALSE(reader.get_error_info(&type, &error, &line));
+    reader.get_element_event(nullptr, &error, &reader.item_name);
+    EXPECT_EQ(reader.get_error(), lmx::err_not_well_formed);
+    EXPECT_TRUE(reader.get_error_info(&type, &error, &line));
+    EXPECT_EQ(type, lmx::error_error);
+    EXPECT_EQ(line, 2);
+    std::string message;
+    EXPECT_EQ(reader.get_error_message(&message), "No Error");
+}
+
+TEST(reader, name_stack_holds_names_with_their_ends) {
+    lmx::c_string_stack stack;
+    {
+        const lmx::c_string_stack_node outer(stack, "Hqf:Color");
+        {
+            const lmx::c_string_stack_node inner(stack, std::string(500, 'x'));
+            EXPECT_EQ(stack.get_stack_size(), 511u);
+            EXPECT_TRUE(inner == std::string(500, 'x'));
+        }
+        EXPECT_STREQ(outer.get_str(), "Hqf:Color");
+        EXPECT_TRUE(outer != "Hqf:Colo") << "length counts";
+        EXPECT_TRUE(outer != "Hqf:Colors");
+        EXPECT_FALSE(outer != "Hqf:Color");
+    }
+    EXPECT_EQ(stack.get_stack_size(), 0u);
+}
+
+TEST(reader, of_a_file) {
+    const temporary_file on_disk("<item/>");
+    std::wstring wide_path(on_disk.path.begin(), on_disk.path.end());
+    lmx::c_xml_reader_file by_path(on_disk.path.c_str());
+    lmx::c_xml_reader_file by_wide_path(wide_path.c_str());
+    lmx::c_xml_reader_file by_handle(std::fopen(on_disk.path.c_str(), "rb"));
+    for (lmx::c_xml_reader_file* const reader : {&by_path, &by_wide_path, &by_handle}) {
+        EXPECT_TRUE(reader->is_open());
+        EXPECT_EQ(walk(*reader), "14#1item 0(34)");
+    }
+    EXPECT_EQ(by_path.get_source_id(), on_disk.path);
+    EXPECT_FALSE(lmx::c_xml_reader_file("/nowhere.hqf").is_open());
+}
+
+TEST(must_understand, looks_through_a_document_before_it_is_loaded) {
+    const struct {
+        const char* text;
+        int answer;
+        const char* why;
+    } rows[] = {
+        {"<a xmlns:m='urn:m'><b>x<c m:u='true'/></b></a>", 2, "the third element"},
+        {"<a xmlns:m='urn:m'><b m:u='0'/><c m:u='maybe'/><d m:u='1'/></a>", 1, "the first answer that is not 0"},
+        {"<a xmlns:m='urn:m'><b m:v='1' u='1'/></a>", 0, "other attributes"},
+        {"<a xmlns:m='urn:m'><b xmlns:m='urn:n' m:u='1'/></a>", 0, "another namespace"},
+        {"<a xmlns:m='urn:m'><b m:u='&nope;'/></a>", 1, "a value that fails"},
+        {"<a><b></c></a>", 1, "tags that don't match"},
+        {"<a><b/>", 1, "the end of input"},
+        {"<a !>", 1, "a bad tag"},
+        {"x", 1, "no element"},
+    };
+    for (const auto& row : rows) {
+        const std::string text = row.text;
+        memory_reader reader(text);
+        EXPECT_EQ(lmx::has_must_understand(reader, "urn:m", "u", lmx::bool_must_understand), row.answer) << row.why;
+    }
+    EXPECT_EQ(lmx::bool_must_understand("false"), 0);
+    EXPECT_EQ(lmx::bool_must_understand("True"), 1);
+}
+
+TEST(must_understand, gives_the_namespace_of_the_root_and_goes_back) {
+    const struct {
+        const char* text;
+        bool is_found;
+        const char* uri;
+    } rows[] = {
+        {"<p:item xmlns:p='urn:f'/>", true, "urn:f"},
+        {"<item xmlns=''/>", true, ""},
+        {"<p:item/>", false, " "},
+        {"<item/>", false, " "},
+        {" &amp;", false, "old"},
+    };
+    for (const auto& row : rows) {
+        const std::string text = row.text;
+        memory_reader reader(text);
+        std::string uri = "old";
+        EXPECT_EQ(lmx::get_instance_namespace(reader, &uri), row.is_found) << text;
+        EXPECT_EQ(uri, row.uri) << text;
+        EXPECT_EQ(reader.find_enumerated_namespace("urn:f"), 0) << "the table is at its new state";
+        reader.set_ns_map(format);
+        memory_reader fresh(text);
+        EXPECT_EQ(walk(reader), walk(fresh)) << "the first element comes again";
+    }
+}
+
+} // namespace

@@ -1,0 +1,128 @@
+#include "support.h"
+
+#include "hqf/xml_in/c_read_file.h"
+#include "hqf/xml_in/c_read_string.h"
+#include "hqf/xml_in/c_xml.h"
+
+#include <gtest/gtest.h>
+
+#include <unistd.h>
+
+namespace xml_in_test {
+
+void recorder::report_error(lmx::elmx_error_type type, lmx::elmx_error code, const char*, int line, const char* text) {
+    reports += " {" + std::to_string(type) + " " + std::to_string(code) + " " + text + "}";
+    last_line = line;
+}
+
+temporary_file::temporary_file(const std::string& bytes)
+    : path([] {
+        static int count = 0;
+        return testing::TempDir() + "xml_in_" + std::to_string(getpid()) + "_" + std::to_string(++count);
+    }()) {
+    std::FILE* const file = std::fopen(path.c_str(), "wb");
+    std::fwrite(bytes.data(), 1, bytes.size(), file);
+    std::fclose(file);
+}
+
+void expect_from_every_source(const std::string& bytes, const driver& run, const std::string& expected,
+                              const std::string& why) {
+    lmx::c_read_memory memory(bytes.data(), static_cast<unsigned int>(bytes.size()));
+    EXPECT_EQ(run(memory), expected) << why << " (memory)";
+    lmx::c_read_string string(bytes);
+    EXPECT_EQ(run(string), expected) << why << " (string)";
+    callers_source callers(bytes);
+    EXPECT_EQ(run(callers), expected) << why << " (caller's source)";
+    const temporary_file on_disk(bytes);
+    lmx::c_read_file file(on_disk.path.c_str());
+    EXPECT_EQ(run(file), expected) << why << " (file)";
+}
+
+void expect_everywhere(const std::string& bytes, const driver& run, const std::string& expected,
+                       const std::string& why) {
+    expect_from_every_source(bytes, run, expected, why);
+    if (bytes.empty() || bytes[0] != '<') return;
+    for (std::size_t edge = 1; edge <= bytes.size() && edge < 512; ++edge) {
+        std::string padded = std::string(512 - edge, ' ') + bytes;
+        lmx::c_read_file open_file(fmemopen(padded.data(), padded.size(), "rb"));
+        ASSERT_EQ(run(open_file), expected) << why << " (edge of a file block at byte " << edge << ")";
+    }
+}
+
+std::string decoded(lmx::c_read& source) {
+    recorder errors;
+    lmx::c_get_as_utf8 getter(source, errors);
+    std::string out;
+    for (int c = getter.get(); c != -1; c = getter.get())
+        out += c < ' ' ? "<" + std::to_string(c) + ">" : std::string(1, static_cast<char>(c));
+    return out + "@" + std::to_string(getter.get_line_num()) + errors.reports;
+}
+
+namespace {
+
+// False where the transcript ends.
+bool put_tag(lmx::c_xml& xml, lmx::c_xml_local* scope, std::string* out) {
+    std::string name;
+    std::string value;
+    switch (xml.get_element_name(scope, &name)) {
+    case lmx::EXE_NAME: break;
+    case lmx::EXE_CHARS: *out += "[" + name + "]"; return true;
+    case lmx::EXE_ELEMENT_END: *out += "</" + name + ">"; return true;
+    case lmx::EXE_EOF: *out += "."; return false;
+    default: *out += "!"; return false;
+    }
+    *out += "<" + name;
+    for (;;) {
+        switch (xml.get_attribute_name(&name, false)) {
+        case lmx::EXE_NAME:
+            *out += " " + name;
+            *out += xml.get_attribute_value(&value, lmx::preserve) ? "='" + value + "'" : "=!";
+            break;
+        case lmx::EXE_START_TAG_END: *out += ">"; return true;
+        case lmx::EXE_ELEMENT_END: *out += "/>"; return true;
+        default: *out += "!"; return false;
+        }
+    }
+}
+
+} // namespace
+
+std::string tokens(lmx::c_read& source) {
+    recorder errors;
+    lmx::c_xml xml(source, errors, true);
+    lmx::c_xml_local scope;
+    std::string out;
+    while (put_tag(xml, &scope, &out)) {
+    }
+    return out + "@" + std::to_string(xml.get_line_num()) + errors.reports;
+}
+
+driver value_in(lmx::elmx_whitespace mode) {
+    return [mode](lmx::c_read& source) {
+        recorder errors;
+        lmx::c_xml xml(source, errors, true);
+        lmx::c_xml_local scope;
+        std::string out;
+        std::string value;
+        xml.get_element_name(&scope, &value);
+        xml.move_to_start_tag_end(nullptr);
+        if (!xml.get_element_value(&value, mode, true)) return "!" + errors.reports;
+        out += "(" + value + ")";
+        put_tag(xml, &scope, &out);
+        return out + errors.reports;
+    };
+}
+
+driver attribute_value_in(lmx::elmx_whitespace mode) {
+    return [mode](lmx::c_read& source) {
+        recorder errors;
+        lmx::c_xml xml(source, errors, true);
+        lmx::c_xml_local scope;
+        std::string value;
+        xml.get_element_name(&scope, &value);
+        xml.get_attribute_name(&value, false);
+        return (xml.get_attribute_value(&value, mode) ? "(" + value + ")" : "!") + errors.reports;
+    };
+}
+
+} // namespace xml_in_test

@@ -1,0 +1,193 @@
+#pragma once
+
+// Archives made by hand, field by field, and the road on which one is loaded. For the tests of the archive layer.
+
+#include "hqf/zip/CZipArchive.h"
+#include "hqf/zip/little_endian.h"
+
+#include <bzlib.h>
+#include <zlib.h>
+
+#include <algorithm>
+#include <cstdlib>
+#include <filesystem>
+#include <fstream>
+#include <iterator>
+#include <string>
+#include <unistd.h>
+#include <vector>
+
+namespace zip_test {
+
+/// A folder of its own for each test program, gone at its end.
+inline const std::filesystem::path& folder() {
+    struct temporary {
+        temporary()
+            : path(std::filesystem::temp_directory_path() / ("hqf-zip-" + std::to_string(::getpid()))) {
+            std::filesystem::create_directories(path);
+        }
+        ~temporary() { std::filesystem::remove_all(path); }
+        std::filesystem::path path;
+    };
+    static const temporary made;
+    return made.path;
+}
+
+inline std::wstring wide(const std::filesystem::path& path) {
+    return path.wstring();
+}
+
+inline void put(const std::filesystem::path& path, const std::string& bytes) {
+    std::ofstream(path, std::ios::binary).write(bytes.data(), static_cast<std::streamsize>(bytes.size()));
+}
+
+inline std::string get(const std::filesystem::path& path) {
+    std::ifstream in(path, std::ios::binary);
+    return {std::istreambuf_iterator<char>(in), {}};
+}
+
+inline std::uint32_t crc_of(const std::string& bytes) {
+    return static_cast<std::uint32_t>(
+        ::crc32(0, reinterpret_cast<const Bytef*>(bytes.data()), static_cast<uInt>(bytes.size())));
+}
+
+inline std::string deflated(const std::string& bytes) {
+    std::string packed(bytes.size() + 100, '\0');
+    z_stream stream{};
+    deflateInit2(&stream, 9, Z_DEFLATED, -15, 8, Z_DEFAULT_STRATEGY);
+    stream.next_in = reinterpret_cast<Bytef*>(const_cast<char*>(bytes.data()));
+    stream.avail_in = static_cast<uInt>(bytes.size());
+    stream.next_out = reinterpret_cast<Bytef*>(packed.data());
+    stream.avail_out = static_cast<uInt>(packed.size());
+    deflate(&stream, Z_FINISH);
+    packed.resize(stream.total_out);
+    deflateEnd(&stream);
+    return packed;
+}
+
+inline std::string bzipped(const std::string& bytes) {
+    std::string packed(bytes.size() + bytes.size() / 50 + 1000, '\0');
+    auto size = static_cast<unsigned int>(packed.size());
+    BZ2_bzBuffToBuffCompress(packed.data(), &size, const_cast<char*>(bytes.data()),
+                             static_cast<unsigned int>(bytes.size()), 1, 0, 0);
+    packed.resize(size);
+    return packed;
+}
+
+/// One entry as both headers tell it; every field can be made to lie.
+struct entry {
+    entry(const std::string& content, std::uint16_t with_method)
+        : method(with_method)
+        , data(with_method == 8    ? deflated(content)
+               : with_method == 12 ? bzipped(content)
+                                   : content)
+        , crc(crc_of(content))
+        , packed_size(static_cast<std::uint32_t>(data.size()))
+        , size(static_cast<std::uint32_t>(content.size())) {}
+
+    std::string name = "a.hqf";
+    std::uint16_t made_by = 46, flags = 0, method;
+    std::string data, behind_data, local_extra, extra, comment;
+    std::uint32_t crc, packed_size, size, external = 0x81B40020;
+    std::uint32_t shift = 0; ///< added to the offset that the directory tells
+};
+
+/// The bytes of an archive, and where its records begin.
+struct archive {
+    std::string bytes;
+    std::size_t central = 0, end = 0;
+};
+
+inline archive build(const std::vector<entry>& entries, const std::string& comment = "", bool reversed = false) {
+    archive made;
+    std::vector<std::string> headers;
+    const auto size16 = [](const std::string& text) { return static_cast<std::uint16_t>(text.size()); };
+    for (const entry& e : entries) {
+        const auto offset = static_cast<std::uint32_t>(made.bytes.size());
+        hqf::field_writer fields, local, central;
+        fields(std::uint16_t{20})(e.flags)(e.method)(std::uint16_t{0x4800})(std::uint16_t{0x58A1});
+        fields(e.crc)(e.packed_size)(e.size)(size16(e.name));
+        local(0x04034B50U).bytes(fields.get().data(), fields.get().size())(size16(e.local_extra));
+        made.bytes += local.get() + e.name + e.local_extra + e.data + e.behind_data;
+        central(0x02014B50U)(e.made_by).bytes(fields.get().data(), fields.get().size());
+        central(size16(e.extra))(size16(e.comment))(0U)(e.external)(offset + e.shift);
+        headers.push_back(central.get() + e.name + e.extra + e.comment);
+    }
+    made.central = made.bytes.size();
+    if (reversed) std::reverse(headers.begin(), headers.end());
+    for (const std::string& header : headers)
+        made.bytes += header;
+    made.end = made.bytes.size();
+    hqf::field_writer end;
+    const auto count = static_cast<std::uint16_t>(entries.size());
+    end(0x06054B50U)(0U)(count)(count)(static_cast<std::uint32_t>(made.end - made.central));
+    end(static_cast<std::uint32_t>(made.central))(size16(comment));
+    made.bytes += end.get() + comment;
+    return made;
+}
+
+/// Causes of our own beside those of `CZipException`: the two ways in which a load ends without an exception.
+enum : int { loaded = 0, no_entry = -1, refused = -2, other_exception = -3 };
+
+struct outcome {
+    int cause;
+    std::string content;
+};
+
+/// Loads the first entry in the way a document is loaded.
+inline outcome load(const std::filesystem::path& path, unsigned int piece = 0xFFFFFFFF) {
+    CZipArchive zip;
+    const auto require = [](bool holds) {
+        if (!holds) throw CZipException(CZipException::generic);
+    };
+    try {
+        require(zip.Open(wide(path), CZipStorage::openReadOnly));
+        zip.OpenFile(0);
+        const CZipFileHeader* const info = zip.GetFileInfo(0);
+        if (info == nullptr) return {no_entry, ""};
+        if (!zip.is_size_credible(0)) return {refused, ""};
+        std::string content(info->GetUncompressedSize(), '\0');
+        const auto size = static_cast<unsigned int>(content.size());
+        for (unsigned int done = 0, count = 1; done < size && count != 0; done += count)
+            require((count = zip.ReadFile(&content[done], std::min(piece, size - done))) != 0);
+        char more;
+        require(zip.ReadFile(&more, 1) == 0);
+        require(zip.CloseFile() == 1);
+        zip.Close();
+        return {loaded, content};
+    } catch (const CZipException& e) {
+        zip.Close(CZipArchive::closeAfterException);
+        zip.Close(CZipArchive::closeAfterException);
+        return {e.GetCause(), ""};
+    } catch (...) {
+        return {other_exception, ""};
+    }
+}
+
+inline outcome load_bytes(const std::string& bytes, unsigned int piece = 0xFFFFFFFF) {
+    const std::filesystem::path path = folder() / "made.zip";
+    put(path, bytes);
+    return load(path, piece);
+}
+
+/// The cause that an action throws, 0 for none.
+template<class Action>
+int cause_of(Action action) {
+    try {
+        action();
+        return 0;
+    } catch (const CZipException& e) {
+        return e.GetCause();
+    }
+}
+
+/// Text that packs neither very well nor very badly.
+inline std::string sample_text(std::size_t size) {
+    std::string text;
+    for (unsigned int i = 1; text.size() < size; i = i * 1103515245U + 12345U)
+        text += "<L>" + std::to_string(i % 9973) + "</L>\n";
+    text.resize(size);
+    return text;
+}
+
+} // namespace zip_test

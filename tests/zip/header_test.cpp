@@ -1,0 +1,199 @@
+#include "archives.h"
+
+#include <gtest/gtest.h>
+
+#include <ctime>
+
+using namespace zip_test;
+
+extern "C" void bz_internal_error(int code);
+
+TEST(zip_header, attributes_by_host) {
+    const struct {
+        std::uint8_t host;
+        std::uint32_t dos, external, back;
+        const char* why;
+    } rows[] = {
+        {0, 0x20, 0x81B40020, 0x20, "writable file with the archive bit"},
+        {0, 0x21, 0x81240021, 0x21, "read-only"},
+        {0, 0x22, 0x80900022, 0x22, "hidden"},
+        {0, 0x10, 0x41FD0010, 0x10, "folder"},
+        {3, 0x20, 0x81B40000, 0x20, "Unix keeps the mode alone"},
+        {3, 0x13, 0x40490010, 0x13, "and the folder bit"},
+        {6, 0x21, 0x00000021, 0x21, "as DOS"},
+        {7, 0x31, 0x00000011, 0x11, "folder and read-only are all there is"},
+        {10, 0x27, 0x00000027, 0x27, "as DOS"},
+    };
+    for (const auto& row : rows) {
+        CZipFileHeader header;
+        header.SetHost(row.host);
+        header.SetSystemAttr(row.dos);
+        EXPECT_EQ(header.GetExternalAttr(), row.external) << row.why;
+        EXPECT_EQ(header.GetSystemAttr(), row.back) << row.why;
+        EXPECT_EQ(header.IsDirectory(), (row.dos & 0x10) != 0) << row.why;
+    }
+    for (int host : {1, 2, 4, 5, 8, 9, 11, 19, 255})
+        EXPECT_EQ(cause_of([=] { CZipFileHeader().SetHost(static_cast<std::uint8_t>(host)); }), 117) << host;
+}
+
+TEST(zip_header, times_in_ms_dos_form) {
+    const struct {
+        int year, month, day, hour, minute, second;
+        std::uint16_t date, time;
+        int back;
+        const char* why;
+    } rows[] = {
+        {2024, 5, 1, 9, 0, 31, 44 << 9 | 5 << 5 | 1, 9 << 11 | 15, 30, "odd seconds lose one"},
+        {1980, 12, 31, 23, 59, 58, 0 << 9 | 12 << 5 | 31, 23 << 11 | 59 << 5 | 29, 58, "first year"},
+        {1975, 2, 3, 4, 5, 6, 0 << 9 | 2 << 5 | 3, 4 << 11 | 5 << 5 | 3, 6, "earlier years become 1980"},
+        {2107, 1, 1, 0, 0, 0, 127 << 9 | 1 << 5 | 1, 0, 0, "last year"},
+        {2150, 1, 1, 0, 0, 0, 127 << 9 | 1 << 5 | 1, 0, 0, "no wrap into the past"},
+    };
+    for (const auto& row : rows) {
+        std::tm local{};
+        local.tm_year = row.year - 1900;
+        local.tm_mon = row.month - 1;
+        local.tm_mday = row.day;
+        local.tm_hour = row.hour;
+        local.tm_min = row.minute;
+        local.tm_sec = row.second;
+        local.tm_isdst = -1;
+        const std::time_t time = std::mktime(&local);
+        CZipFileHeader header;
+        header.SetTime(time);
+        EXPECT_EQ(header.GetDosDate(), row.date) << row.why;
+        EXPECT_EQ(header.GetDosTime(), row.time) << row.why;
+        if (row.year >= 1980 && row.year <= 2107) {
+            EXPECT_EQ(header.GetTime(), time - row.second + row.back) << row.why;
+        }
+    }
+    CZipFileHeader header;
+    header.SetTime(INT64_MAX);
+    EXPECT_EQ(header.GetDosDate(), 1 << 5 | 1) << "a time without a local form";
+}
+
+TEST(zip_header, names_turn_their_separators_by_host) {
+    CZipFileHeader header;
+    EXPECT_EQ(header.GetFileName(), L"");
+    header.SetFileName(L"a\\b/c");
+    EXPECT_EQ(header.GetStoredName(), "a/b/c");
+    EXPECT_EQ(header.GetFileName(), L"a\\b\\c");
+    header.SetHost(10);
+    EXPECT_EQ(header.GetFileName(), L"a\\b\\c");
+    header.SetHost(3);
+    EXPECT_EQ(header.GetFileName(), L"a/b/c");
+    EXPECT_EQ(header.GetNameCodePage(), 0U);
+    header.SetHost(0);
+    EXPECT_EQ(header.GetNameCodePage(), 1U);
+    header.SetFileName(L"\u00E9");
+    header.SetNameCodePage(1252);
+    EXPECT_EQ(header.GetStoredName(), "?") << "stored anew in the new code page";
+}
+
+TEST(zip_header, prepare_data_sets_flags_and_version) {
+    const struct {
+        int level;
+        bool spanned;
+        std::uint16_t flags;
+    } rows[] = {{-1, false, 0}, {0, false, 0}, {1, false, 6}, {2, false, 4}, {3, false, 0},
+                {7, false, 0},  {8, false, 2}, {9, false, 2}, {-1, true, 8}, {1, true, 14}};
+    for (const auto& row : rows) {
+        CZipFileHeader header;
+        header.PrepareData(row.level, row.spanned);
+        EXPECT_EQ(header.GetFlags(), row.flags) << row.level;
+        EXPECT_EQ(header.GetVersionNeeded(), 20) << row.level;
+        EXPECT_EQ(header.GetVersionMadeBy(), 46) << row.level;
+    }
+    CZipFileHeader folder;
+    folder.SetSystemAttr(0x10);
+    folder.PrepareData(0, false);
+    EXPECT_EQ(folder.GetVersionNeeded(), 10);
+}
+
+TEST(zip_extra_field, is_well_formed_when_records_fill_it) {
+    const std::string record("\x4C\x5A\x02\x00xy", 6), empty("\x01\x00\x00\x00", 4);
+    const struct {
+        std::string bytes;
+        bool holds;
+        const char* why;
+    } rows[] = {
+        {"", true, "no record"},
+        {record, true, "one"},
+        {record + empty, true, "two, one without data"},
+        {record.substr(0, 5), false, "a record claims more than remains"},
+        {record + "x", false, "a remainder of 1"},
+        {record + "xy", false, "of 2"},
+        {"xyz", false, "of 3"},
+    };
+    for (const auto& row : rows) {
+        CZipExtraField field;
+        EXPECT_EQ(field.Read(row.bytes.data(), row.bytes.size()), row.holds) << row.why;
+        EXPECT_EQ(field.GetBytes(), row.holds ? row.bytes : "") << row.why;
+    }
+}
+
+// The record of code pages and names in a central header: version, flags, then what they announce.
+TEST(zip_header, record_of_names_overrides_code_page_and_name) {
+    const std::string name_page("\xE2\x04\0\0", 4), comment_page("\xE9\xFD\0\0", 4); // 1250, 65001
+    const auto record = [](const std::string& data) {
+        return hqf::field_writer()(std::uint16_t{0x5A4C})(static_cast<std::uint16_t>(data.size())).get() + data;
+    };
+    using std::string_literals::operator""s;
+    const struct {
+        std::string data;
+        int cause;
+        std::string name;
+        std::uint32_t name_page, comment_page;
+        const char* why;
+    } rows[] = {
+        {"\1\0"s, 0, "a.hqf", 1, 0, "announces nothing"},
+        {"\1\1"s + name_page, 0, "a.hqf", 1250, 0, "code page of the name"},
+        {"\0\1"s + name_page, 0, "a.hqf", 1250, 0, "version 0"},
+        {"\2\1"s + name_page, 0, "a.hqf", 1, 0, "a later version says nothing"},
+        {"\1\3"s + name_page + "other", 0, "other", 1250, 0, "the name itself"},
+        {"\1\7"s + name_page + "other" + comment_page, 0, "other", 1250, 65001, "all three"},
+        {"\1\4"s + comment_page, 0, "a.hqf", 1, 65001, "code page of the comment"},
+        {"\1\5"s + name_page + comment_page, 0, "a.hqf", 1250, 65001, "both code pages"},
+        {"\1\2"s, 0, "a.hqf", 1, 0, "bit 1 without bit 0 is no name"},
+        {"\1"s, 101, "", 0, 0, "no flags"},
+        {""s, 101, "", 0, 0, "nothing"},
+        {"\1\1\1\1\1"s, 101, "", 0, 0, "half a code page"},
+        {"\1\4\1\1\1"s, 101, "", 0, 0, "half a code page of the comment"},
+        {"\1\7"s + name_page + "abc", 101, "", 0, 0, "no room for the second code page"},
+    };
+    for (const auto& row : rows) {
+        entry e("content", 0);
+        e.extra = record(row.data);
+        put(folder() / "names.zip", build({e}).bytes);
+        CZipArchive zip;
+        EXPECT_EQ(cause_of([&] { zip.Open(wide(folder() / "names.zip"), 1); }), row.cause) << row.why;
+        if (row.cause != 0) continue;
+        const CZipFileHeader& header = *zip.GetFileInfo(0);
+        EXPECT_EQ(header.GetStoredName(), row.name) << row.why;
+        EXPECT_EQ(header.GetNameCodePage(), row.name_page) << row.why;
+        EXPECT_EQ(header.GetCommentCodePage(), row.comment_page) << row.why;
+    }
+}
+
+TEST(zip_compressors, causes_of_library_results) {
+    CZipStorage storage;
+    ZipArchiveLib::CDeflateCompressor deflate(&storage);
+    ZipArchiveLib::CBzip2Compressor bzip2(&storage);
+    const struct {
+        int code, zlib, bzip2;
+    } rows[] = {{1, 500, 100},  {2, 501, 100},   {-1, 502, 600}, {-2, 503, 601}, {-3, 504, 602},
+                {-4, 505, 603}, {-5, 506, 604},  {-6, 507, 605}, {-7, 100, 606}, {-8, 100, 607},
+                {-9, 100, 608}, {-10, 100, 100}, {0, 100, 100},  {3, 100, 100}};
+    for (const auto& row : rows) {
+        EXPECT_EQ(deflate.ConvertInternalError(row.code), row.zlib) << row.code;
+        EXPECT_EQ(bzip2.ConvertInternalError(row.code), row.bzip2) << row.code;
+        EXPECT_EQ(deflate.IsCodeErrorOK(row.code), row.code == 0 || row.code == 2) << row.code;
+        EXPECT_EQ(bzip2.IsCodeErrorOK(row.code), row.code >= 0 && row.code <= 3) << row.code;
+    }
+    for (const std::uint16_t method : std::initializer_list<std::uint16_t>{0, 8, 12, 9, 1}) {
+        EXPECT_EQ(deflate.CanProcess(method), method == 0 || method == 8) << method;
+        EXPECT_EQ(bzip2.CanProcess(method), method == 12) << method;
+    }
+    EXPECT_EQ(deflate.GetOptions()->buffer_size, 131072U);
+    EXPECT_EQ(cause_of([] { bz_internal_error(1007); }), 609);
+}

@@ -1,0 +1,254 @@
+#include "archives.h"
+
+#include <gtest/gtest.h>
+
+#include <cerrno>
+
+using namespace zip_test;
+
+namespace {
+
+constexpr int any_failure = 1000000;
+const std::string content = sample_text(700);
+
+void set_field(std::string& bytes, std::size_t at, int width, std::uint64_t value) {
+    for (int i = 0; i < width; ++i)
+        bytes[at + static_cast<std::size_t>(i)] = static_cast<char>(value >> (8 * i));
+}
+
+bool is_in_the_tables(int cause) {
+    return (cause > 0 && cause <= 103) || cause == 112 || cause == 118 || cause == 120 ||
+           (cause >= 500 && cause <= 507) || (cause >= 600 && cause <= 608) || cause == refused || cause == no_entry;
+}
+
+/// Whatever was done to an archive: it loads as what it was, or it fails with a cause of the tables.
+void expect_sound(const outcome& got, const std::string& what) {
+    if (got.cause == 0) {
+        EXPECT_TRUE(got.content == content) << what << " loads as something else";
+    } else {
+        EXPECT_TRUE(is_in_the_tables(got.cause)) << what << " gives " << got.cause;
+    }
+}
+
+} // namespace
+
+TEST(zip_hostile, each_field_wrong_alone) {
+    enum record { local, central, end };
+    const archive sound = build({entry(content, 8)});
+    const auto directory = static_cast<std::uint32_t>(sound.central);
+    const struct {
+        record in;
+        std::size_t at;
+        int width;
+        std::uint64_t value;
+        int cause;
+        const char* why;
+    } rows[] = {
+        {local, 0, 4, 0x04034B51, 101, "signature"},
+        {local, 4, 2, 99, 0, "version needed counts for nothing"},
+        {local, 6, 2, 1, 101, "flag of encryption"},
+        {local, 6, 2, 2, 101, "flag of deflate"},
+        {local, 6, 2, 8, 101, "flag of the descriptor"},
+        {local, 6, 2, 0x0810, 0, "flags above the low four are not compared"},
+        {local, 8, 2, 0, 101, "method"},
+        {local, 10, 4, 0, 0, "time and date count for nothing"},
+        {local, 14, 4, 1, 101, "CRC-32"},
+        {local, 18, 4, 0, 0, "packed size 0 is unknown yet"},
+        {local, 18, 4, 1, 101, "packed size"},
+        {local, 22, 4, 0, 101, "size 0 is no excuse"},
+        {local, 26, 2, 6, any_failure, "length of the name: data begin too late"},
+        {local, 26, 2, 0xFFFF, 101, "a name longer than the file"},
+        {local, 28, 2, 4, any_failure, "length of the extra field"},
+        {local, 28, 2, 3, 101, "an extra field of 3 bytes"},
+        {local, 28, 2, 0xFFFF, 101, "an extra field longer than the file"},
+        {central, 0, 4, 0x02014B51, 101, "signature"},
+        {central, 4, 1, 255, 0, "version made by"},
+        {central, 5, 1, 77, 0, "a host that is not known"},
+        {central, 6, 2, 0xFFFF, 0, "version needed"},
+        {central, 8, 2, 1, 101, "encrypted here alone"},
+        {central, 10, 2, 0, 101, "method"},
+        {central, 10, 2, 99, 101, "method not read, and not the local one"},
+        {central, 12, 4, 0xFFFFFFFF, 0, "time and date"},
+        {central, 16, 4, 1, 101, "CRC-32"},
+        {central, 20, 4, 1, 101, "packed size"},
+        {central, 24, 4, 0xFFFFFFFF, 101, "size"},
+        {central, 28, 2, 6, 0, "the name takes a byte of the end record, and no name is looked at"},
+        {central, 28, 2, 0xFFFF, 101, "a name longer than the file"},
+        {central, 30, 2, 1, 101, "an extra field of 1 byte"},
+        {central, 30, 2, 0xFFFF, 101, "an extra field longer than the file"},
+        {central, 32, 2, 1, 0, "the comment takes a byte of the end record"},
+        {central, 32, 2, 0xFFFF, 101, "a comment longer than the file"},
+        {central, 34, 2, 7, 0, "disk number orders entries only"},
+        {central, 36, 2, 0xFFFF, 0, "internal attributes"},
+        {central, 38, 4, 0xFFFFFFFF, 0, "external attributes"},
+        {central, 42, 4, 1, 101, "offset of the local header"},
+        {central, 42, 4, directory, 101, "offset of another record"},
+        {central, 42, 4, 0x7FFFFFFF, 101, "offset beyond the file"},
+        {central, 42, 4, 0xFFFFFFFF, 101, "offset that no file can have"},
+        {end, 0, 4, 0x06054B51, 118, "signature"},
+        {end, 4, 2, 1, 103, "a volume"},
+        {end, 4, 2, 0xFFFF, 103, "all ones without a ZIP64 locator"},
+        {end, 6, 2, 1, 0, "the directory's disk only decides about bytes in front"},
+        {end, 8, 2, 0xFFFF, 0, "entries on this disk"},
+        {end, 10, 2, 0, 101, "no entry, but a directory"},
+        {end, 10, 2, 2, 101, "one entry too many"},
+        {end, 10, 2, 0xFFFF, 101, "65,534 entries too many"},
+        {end, 12, 4, 0, 101, "an entry, but no directory"},
+        {end, 12, 4, sound.end - sound.central - 1, 101, "a directory too short"},
+        {end, 12, 4, sound.end - sound.central + 1, 101, "a directory that reaches into the end record"},
+        {end, 12, 4, 0xFFFFFFFF, 101, "a directory of 4 GB"},
+        {end, 16, 4, directory - 1, 101, "offset too small: all others are shifted"},
+        {end, 16, 4, directory + 1, 101, "offset too large"},
+        {end, 16, 4, 0xFFFFFFFF, 101, "offset that no file can have"},
+        {end, 20, 2, 1, 101, "a comment that is not there"},
+    };
+    for (const auto& row : rows) {
+        archive made = sound;
+        set_field(made.bytes,
+                  row.at + (row.in == local     ? 0
+                            : row.in == central ? sound.central
+                                                : sound.end),
+                  row.width, row.value);
+        const outcome got = load_bytes(made.bytes);
+        const std::string where = "record " + std::to_string(row.in) + " at " + std::to_string(row.at) + ": ";
+        if (row.cause == any_failure) {
+            EXPECT_TRUE(got.cause != 0 && is_in_the_tables(got.cause)) << where << row.why << ", got " << got.cause;
+        } else {
+            EXPECT_EQ(got.cause, row.cause) << where << row.why;
+        }
+        expect_sound(got, where + row.why);
+    }
+}
+
+TEST(zip_hostile, both_headers_lie_alike) {
+    const auto lie = [](std::uint16_t method, auto change) {
+        entry e(content, method);
+        change(e);
+        return build({e}).bytes;
+    };
+    const struct {
+        std::string bytes;
+        std::vector<int> causes;
+        const char* why;
+    } rows[] = {
+        {lie(8, [](entry& e) { e.size += 1; }), {100}, "deflate: one byte more"},
+        {lie(8, [](entry& e) { e.size -= 1; }), {101}, "deflate: one byte less"},
+        {lie(8, [](entry& e) { e.size = 0; }), {101}, "deflate: nothing"},
+        {lie(8, [](entry& e) { e.size = e.packed_size * 1032; }), {100}, "deflate: the most it could be"},
+        {lie(8, [](entry& e) { e.size = e.packed_size * 1032 + 1; }), {refused}, "deflate: one more than that"},
+        {lie(8, [](entry& e) { e.packed_size -= 1; }), {101, 504, 506}, "deflate: packed data cut"},
+        {lie(8, [](entry& e) { e.packed_size -= 20; }), {504, 506}, "deflate: cut by more"},
+        {lie(8, [](entry& e) { e.packed_size = 0; }), {refused}, "deflate: no packed data"},
+        {lie(8, [](entry& e) { e.packed_size += 1, e.data += "x"; }), {0}, "deflate: more than the stream takes"},
+        {lie(8, [](entry& e) { e.packed_size += 6; }), {refused}, "deflate: packed data reach into the directory"},
+        {lie(8, [](entry& e) { e.size = e.packed_size = 0, e.data = ""; }), {101}, "deflate: no stream at all"},
+        {lie(0, [](entry& e) { e.size += 1; }), {refused}, "stored: one byte more"},
+        {lie(0, [](entry& e) { e.size -= 1; }), {101}, "stored: one byte less"},
+        {lie(0, [](entry& e) { e.size -= 1, e.crc = crc_of(content.substr(0, e.size)); }),
+         {101},
+         "stored: one byte less, and the CRC-32 agrees"},
+        {lie(0, [](entry& e) { e.packed_size = e.size = 0xFFFFFFFE; }), {refused}, "stored: 4 GB of it"},
+        {lie(12, [](entry& e) { e.size += 1; }), {100}, "bzip2: one byte more"},
+        {lie(12, [](entry& e) { e.size -= 1; }), {101}, "bzip2: one byte less"},
+        {lie(12, [](entry& e) { e.size = 0; }), {101}, "bzip2: nothing"},
+        {lie(12, [](entry& e) { e.size = e.packed_size * 10000 + 1; }), {refused}, "bzip2: more than is believed"},
+        {lie(12, [](entry& e) { e.packed_size -= 1; }), {101}, "bzip2: packed data cut"},
+        {lie(12, [](entry& e) { e.data[0] = 'x'; }), {604}, "bzip2: no bzip2 (BZ_DATA_ERROR_MAGIC)"},
+        {lie(8, [](entry& e) { e.flags = 1; }), {112}, "encrypted"},
+        {lie(9, [](entry&) {}), {100}, "a method that is not read"},
+        {lie(99, [](entry& e) { e.flags = 1; }), {100}, "AES: the method is looked at first"},
+        {build({entry(content, 8), entry("x", 0)}).bytes, {0}, "sound, to hold the next against"},
+        {[&] {
+             std::vector<entry> twins = {entry(content, 8), entry("x", 0)};
+             twins[1].shift = 0 - static_cast<std::uint32_t>(build({twins[0]}).central);
+             return build(twins).bytes;
+         }(),
+         {101},
+         "two entries at one offset"},
+    };
+    for (const auto& row : rows) {
+        const outcome got = load_bytes(row.bytes);
+        EXPECT_NE(std::find(row.causes.begin(), row.causes.end(), got.cause), row.causes.end())
+            << row.why << ", got " << got.cause;
+    }
+}
+
+TEST(zip_hostile, zip64_is_refused_where_a_locator_says_so) {
+    const struct {
+        std::size_t at;
+        int width;
+        bool has_locator;
+        int cause;
+    } rows[] = {{4, 2, true, 120},  {6, 2, true, 120}, {8, 2, true, 120},   {10, 2, true, 120}, {12, 4, true, 120},
+                {16, 4, true, 120}, {8, 2, false, 0},  {10, 2, false, 101}, {0, 0, true, 0}};
+    for (const auto& row : rows) {
+        entry e(content, 8);
+        if (row.has_locator) e.comment = "PK\6\7";
+        archive made = build({e});
+        set_field(made.bytes, made.end + row.at, row.width, ~std::uint64_t{0});
+        EXPECT_EQ(load_bytes(made.bytes).cause, row.cause) << row.at << (row.has_locator ? " with" : " without");
+    }
+}
+
+TEST(zip_hostile, an_empty_directory_lies_before_its_end_record) {
+    for (const std::uint64_t offset : {0U, 1U}) {
+        archive made = build({});
+        set_field(made.bytes, made.end + 16, 4, offset);
+        EXPECT_EQ(load_bytes(made.bytes).cause, offset == 0 ? static_cast<int>(no_entry) : 101);
+    }
+}
+
+TEST(zip_hostile, cut_anywhere) {
+    for (const std::uint16_t method : std::initializer_list<std::uint16_t>{0, 8, 12}) {
+        const archive made = build({entry(content, method)}, "comment");
+        for (std::size_t size = 0; size < made.bytes.size(); ++size)
+            EXPECT_EQ(load_bytes(made.bytes.substr(0, size)).cause, size < made.end + 4 ? 118 : 101)
+                << "method " << method << ", first " << size << " bytes";
+    }
+}
+
+TEST(zip_hostile, every_byte_changed) {
+    entry described(content, 8);
+    described.flags = 8;
+    described.behind_data = std::string(16, 'd');
+    entry extra(content, 8);
+    extra.extra = extra.local_extra = std::string("\x4C\x5A\x0B\0\1\7\1\0\0\0n\1\0\0\0", 15);
+    const std::string sound[] = {build({entry(content, 0)}).bytes, build({entry(content, 8)}).bytes,
+                                 build({entry(content, 12)}).bytes, build({described}).bytes,
+                                 build({extra, entry(content, 0)}, "comment").bytes};
+    for (const std::string& bytes : sound) {
+        ASSERT_EQ(load_bytes(bytes).cause, 0);
+        for (std::size_t at = 0; at < bytes.size(); ++at)
+            for (int change : {0x01, 0x80, 0xFF, 0x08}) {
+                std::string changed = bytes;
+                changed[at] = static_cast<char>(changed[at] ^ change);
+                expect_sound(load_bytes(changed), "byte " + std::to_string(at) + " ^ " + std::to_string(change));
+            }
+    }
+}
+
+TEST(zip_hostile, archives_of_2_gib) {
+    const auto path = folder() / "large.zip";
+    const struct {
+        std::uintmax_t size;
+        int cause;
+    } rows[] = {{0x7FFFFFFF, 118}, {0x80000000, EOVERFLOW}, {0x100000000, EOVERFLOW}};
+    for (const auto& row : rows) {
+        put(path, "");
+        std::filesystem::resize_file(path, row.size);
+        EXPECT_EQ(load(path).cause, row.cause) << row.size;
+    }
+    // A write that would carry the file there is refused before anything wraps, and the entry is gone with it.
+    std::filesystem::resize_file(path, 0x7FFFFFFF - 100);
+    const std::string large(300000, 'x');
+    CZipArchive zip;
+    ASSERT_TRUE(zip.Open(wide(path), CZipStorage::append));
+    CZipFileHeader header;
+    header.SetFileName(L"a");
+    ASSERT_TRUE(zip.OpenNewFile(header, 0));
+    EXPECT_EQ(cause_of([&] { zip.WriteNewFile(large.data(), static_cast<unsigned int>(large.size())); }), EFBIG);
+    EXPECT_FALSE(zip.CloseNewFile());
+    EXPECT_EQ(zip.GetCount(), 0U);
+    zip.Close(CZipArchive::closeAfterException);
+    std::filesystem::remove(path);
+}

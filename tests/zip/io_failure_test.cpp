@@ -1,0 +1,179 @@
+// Every call to the system fails once. The functions below stand before those of the C library.
+
+#include "archives.h"
+
+#include <gtest/gtest.h>
+
+#include <cerrno>
+#include <cstdarg>
+#include <dlfcn.h>
+#include <fcntl.h>
+#include <sys/stat.h>
+
+using namespace zip_test;
+
+namespace {
+
+enum class way { error, interrupt, part };
+enum call { call_open, call_read, call_write, call_seek, call_sync, call_close, call_status, calls };
+
+struct {
+    int left = -1; // calls until the one that fails; -1: none fails
+    way how = way::error;
+    bool failed = false;
+    call what = calls;
+    unsigned kinds = 0; // of calls that failed, a bit each
+    int open_files = 0;
+} trap;
+
+bool springs(call what) {
+    if (trap.left < 0 || trap.left-- != 0) return false;
+    trap.failed = true;
+    trap.what = what;
+    trap.kinds |= 1U << what;
+    errno = trap.how == way::interrupt ? EINTR : EDQUOT;
+    return true;
+}
+
+template<class Function>
+Function* next(const char* name) {
+    return reinterpret_cast<Function*>(dlsym(RTLD_NEXT, name));
+}
+
+} // namespace
+
+extern "C" {
+int open(const char* path, int flags, ...) {
+    va_list arguments;
+    va_start(arguments, flags);
+    const int mode = va_arg(arguments, int);
+    va_end(arguments);
+    if (trap.how == way::error && springs(call_open)) return -1;
+    static auto* const real = next<int(const char*, int, ...)>("open");
+    const int descriptor = real(path, flags, mode);
+    if (descriptor >= 0) ++trap.open_files;
+    return descriptor;
+}
+ssize_t read(int descriptor, void* buffer, size_t size) {
+    static auto* const real = next<ssize_t(int, void*, size_t)>("read");
+    if (!springs(call_read)) return real(descriptor, buffer, size);
+    return trap.how == way::part ? real(descriptor, buffer, (size + 1) / 2) : -1;
+}
+ssize_t write(int descriptor, const void* buffer, size_t size) {
+    static auto* const real = next<ssize_t(int, const void*, size_t)>("write");
+    if (!springs(call_write)) return real(descriptor, buffer, size);
+    return trap.how == way::part ? real(descriptor, buffer, (size + 1) / 2) : -1;
+}
+off_t lseek(int descriptor, off_t offset, int origin) noexcept {
+    static auto* const real = next<off_t(int, off_t, int)>("lseek");
+    return trap.how == way::error && springs(call_seek) ? -1 : real(descriptor, offset, origin);
+}
+int fsync(int descriptor) {
+    static auto* const real = next<int(int)>("fsync");
+    return trap.how == way::error && springs(call_sync) ? -1 : real(descriptor);
+}
+int close(int descriptor) {
+    static auto* const real = next<int(int)>("close");
+    const int result = real(descriptor);
+    if (result == 0) --trap.open_files;
+    return trap.how == way::error && springs(call_close) ? -1 : result;
+}
+int stat(const char* path, struct stat* status) noexcept {
+    static auto* const real = next<int(const char*, struct stat*)>("stat");
+    return trap.how == way::error && springs(call_status) ? -1 : real(path, status);
+}
+}
+
+namespace {
+
+/// Runs `action` with the k-th call failing, for every k until none is left to fail; `expect` judges each run.
+template<class Action, class Expect>
+void fail_each_call(way how, int least, Action action, Expect expect) {
+    trap.kinds = 0;
+    for (int k = 0;; ++k) {
+        const int before = trap.open_files;
+        trap.left = k;
+        trap.how = how;
+        trap.failed = false;
+        const int cause = action();
+        trap.left = -1;
+        trap.how = way::error;
+        EXPECT_EQ(trap.open_files, before) << "files left open, call " << k;
+        if (!trap.failed) {
+            EXPECT_EQ(cause, 0);
+            EXPECT_GE(k, least) << "fewer calls than the work needs";
+            return;
+        }
+        expect(k, cause);
+    }
+}
+
+} // namespace
+
+TEST(zip_io_failure, load_fails_with_the_error_of_any_call) {
+    const auto path = folder() / "io.zip";
+    for (const std::uint16_t method : std::initializer_list<std::uint16_t>{0, 8, 12}) {
+        put(path, build({entry(sample_text(300000), method)}, "comment").bytes);
+        fail_each_call(
+            way::error, 15, [&] { return load(path).cause; },
+            // EDQUOT has the number 122 here, which as a cause means something else.
+            [](int k, int cause) { EXPECT_EQ(cause, ENOSPC) << "call " << k << " of kind " << trap.what; });
+        for (way how : {way::interrupt, way::part})
+            fail_each_call(
+                how, 5, [&] { return load(path).cause; },
+                [](int k, int cause) { EXPECT_EQ(cause, 0) << "call " << k; });
+    }
+}
+
+TEST(zip_io_failure, save_fails_or_is_whole) {
+    const auto source = folder() / "io.hqf", path = folder() / "io-saved.zip";
+    std::string noise = sample_text(200000);
+    for (std::size_t i = 0; i < noise.size(); ++i)
+        noise[i] = static_cast<char>(noise[i] * 31 + static_cast<int>(i * i >> 7));
+    put(source, noise);
+    const auto save = [&] {
+        CZipArchive zip;
+        try {
+            zip.Open(wide(path), CZipStorage::create);
+            zip.SetCompressionMethod(8);
+            if (!zip.AddNewFile(wide(source))) throw CZipException(CZipException::generic);
+            zip.Close();
+            return 0;
+        } catch (const CZipException& e) {
+            zip.Close(CZipArchive::closeAfterException);
+            return e.GetCause();
+        }
+    };
+    const auto is_whole = [&] { return load(path).content == noise; };
+    fail_each_call(way::error, 20, save, [&](int k, int cause) {
+        // Only the source may fail to close unheard: everything of it had been read.
+        const int expected = trap.what == call_status ? 100 : ENOSPC;
+        if (cause == 0) {
+            EXPECT_TRUE(trap.what == call_close && is_whole()) << "call " << k << " of kind " << trap.what;
+        } else {
+            EXPECT_TRUE(cause == expected || cause == 100) << "call " << k << " of kind " << trap.what << ": " << cause;
+        }
+    });
+    EXPECT_EQ(trap.kinds, (1U << calls) - 1) << "a save reads, writes, seeks, and waits for the disk";
+    for (way how : {way::interrupt, way::part})
+        fail_each_call(how, 5, save, [&](int k, int cause) {
+            EXPECT_EQ(cause, 0) << "call " << k;
+            EXPECT_TRUE(is_whole()) << "call " << k;
+        });
+}
+
+TEST(zip_io_failure, a_full_device_is_told_at_the_latest_by_close) {
+    if (!std::filesystem::exists("/dev/full")) GTEST_SKIP();
+    CZipArchive zip;
+    ASSERT_TRUE(zip.Open(L"/dev/full", CZipStorage::create));
+    CZipFileHeader header;
+    header.SetFileName(L"a");
+    EXPECT_EQ(cause_of([&] {
+                  zip.OpenNewFile(header);
+                  zip.CloseNewFile();
+                  zip.Close();
+              }),
+              ENOSPC);
+    zip.Close(CZipArchive::closeAfterException);
+    EXPECT_TRUE(zip.IsClosed());
+}
