@@ -1,0 +1,121 @@
+#!/usr/bin/env python3
+"""Runs the benchmarks and prints their tables: speed of loading and writing beside the peers, and the heap of a load.
+
+usage: bench/table.py [--build FOLDER] [--sizes 1,50] [--repetitions 5] [--cpu N] [--quick]
+
+Speeds are medians, in million bytes of document a second of CPU time. The repetitions of all rows are interleaved, so
+that a slow minute of the machine falls on every peer alike. A ratio is this library's speed divided by the peer's; the
+floor is the ratio that the project promises, and "below" marks what misses it.
+"""
+
+from __future__ import annotations
+
+import argparse
+import json
+import statistics
+import sys
+from pathlib import Path
+
+from measure import Row, run_benchmarks, run_program, usual_build_folder
+
+ORDINARY = ("palettes", "spectra", "quality_control")
+KINDS = (*ORDINARY, "mix")
+LOAD_FLOORS = {**dict.fromkeys(ORDINARY, 2.5), "mix": 1.8}
+WRITE_FLOORS = {**dict.fromkeys(ORDINARY, 1.5), "mix": 1.0}
+HEAP_LIMIT = 5.0
+
+# task, the peer that the floor is about, floors, all peers in the order of the columns
+COMPARISONS = (
+    ("load", "expat", LOAD_FLOORS, ("hqf", "expat", "pugixml")),
+    ("write", "pugixml", WRITE_FLOORS, ("hqf", "pugixml", "pugixml_raw")),
+)
+OTHER_ROWS = ("load/hqf_file", "load/hqf_string", "write/hqf_file", "write/hqf_string",
+              "objects/destroy", "objects/copy", "objects/equal")
+
+
+def markdown(head: list[str], lines: list[list[str]]) -> str:
+    widths = [max(len(line[i]) for line in [head, *lines]) for i in range(len(head))]
+    def line_text(cells: list[str]) -> str:
+        return "| " + " | ".join(cell.ljust(width) for cell, width in zip(cells, widths)) + " |"
+    rule = "|" + "|".join("-" * (width + 2) for width in widths) + "|"
+    return "\n".join([line_text(head), rule, *map(line_text, lines)])
+
+
+def floor_text(ratio: float | None, floor: float) -> str:
+    if ratio is None:
+        return f"{floor}"
+    return f"{floor}" + (" below" if ratio < floor else "")
+
+
+def comparison(rows: dict[str, Row], documents: list[tuple[str, str]], task: str, rival: str,
+               floors: dict[str, float], peers: tuple[str, ...]) -> str:
+    head = ["kind", "size", *(f"{peer} MB/s" for peer in peers), *(f"hqf/{peer}" for peer in peers[1:]), "floor"]
+    lines = []
+    for kind, size in documents:
+        speeds = [rows[name].speed if (name := f"{task}/{kind}/{size}/{peer}") in rows else None for peer in peers]
+        if speeds[0] is None:
+            continue
+        ratios = {peer: speeds[0] / speed if speed else None for peer, speed in zip(peers, speeds)}
+        lines.append([kind, size, *(f"{speed:.0f}" if speed else "-" for speed in speeds),
+                      *(f"{ratios[peer]:.2f}" if ratios[peer] else "-" for peer in peers[1:]),
+                      f"{rival}: " + floor_text(ratios[rival], floors[kind])])
+    checks = [[peer, next((row.checks for row in rows.values() if row.task == task and row.peer == peer), "not built")]
+              for peer in peers]
+    return markdown(head, lines) + "\n\n" + markdown([f"{task}: peer", "what it checks"], checks)
+
+
+def other_speeds(rows: dict[str, Row], documents: list[tuple[str, str]]) -> str:
+    lines = []
+    for kind, size in documents:
+        cells = []
+        for column in OTHER_ROWS:
+            task, peer = column.split("/")
+            row = rows.get(f"{task}/{kind}/{size}/{peer}")
+            cells.append(f"{row.speed:.0f}" if row else "-")
+        lines.append([kind, size, *cells])
+    return markdown(["kind", "size", *(f"{name} MB/s" for name in OTHER_ROWS)], lines)
+
+
+def heap_table(build: Path, sizes: str, cpu: int | None) -> str:
+    lines = []
+    for line in run_program([str(build / "bench/hqf_bench_memory"), f"--sizes={sizes}"], cpu).splitlines():
+        kind, size, peer, given, *counted = line.split("\t")
+        peak, loaded, by_allocator, left = (int(number) / int(given) for number in counted)
+        limit = (f"{HEAP_LIMIT:.0f}" + (" above" if peak > HEAP_LIMIT else "")) if peer == "hqf" else "-"
+        lines.append([kind, size + "MB", peer, f"{peak:.2f}", f"{loaded:.2f}", f"{by_allocator:.2f}", f"{left:.4f}",
+                      limit])
+    return markdown(["kind", "size", "peer", "peak", "loaded", "loaded, by mallinfo2", "left behind", "limit"], lines)
+
+
+def main() -> int:
+    parser = argparse.ArgumentParser(description=__doc__, formatter_class=argparse.RawDescriptionHelpFormatter)
+    parser.add_argument("--build", type=Path, default=usual_build_folder(), help="build folder (default: %(default)s)")
+    parser.add_argument("--sizes", default="1,50", help="million bytes, separated by commas (default: %(default)s)")
+    parser.add_argument("--repetitions", type=int, default=5)
+    parser.add_argument("--cpu", type=int, help="keep the programs on this CPU")
+    parser.add_argument("--quick", action="store_true", help="1 MB alone and short runs: a look, not a result")
+    parser.add_argument("--json", type=Path, help="also save the raw results here")
+    options = parser.parse_args()
+    if options.quick:
+        options.sizes, options.repetitions = "1", 3
+
+    raw = run_benchmarks(options.build, options.sizes, options.repetitions, 0.05 if options.quick else 0.3, options.cpu)
+    if options.json:
+        options.json.write_text(json.dumps(raw, indent=1), encoding="utf-8")
+    rows = Row.medians(raw)
+    documents = sorted({(row.kind, row.size) for row in rows.values()},
+                       key=lambda document: (int(document[1].removesuffix("MB")), KINDS.index(document[0])))
+    context = raw["context"]
+    print(f"{context['num_cpus']} CPUs of {context['mhz_per_cpu']} MHz, load {context['load_avg']}, "
+          f"median of {options.repetitions}\n")
+    for task, rival, floors, peers in COMPARISONS:
+        print(f"## {task.capitalize()}\n\n{comparison(rows, documents, task, rival, floors, peers)}\n")
+    print(f"## Other rows\n\n{other_speeds(rows, documents)}\n")
+    print(f"## Heap of a load, bytes per byte of input\n\n{heap_table(options.build, options.sizes, options.cpu)}")
+    spread = [row.spread for row in rows.values() if row.task in ("load", "write")]
+    print(f"\nSpread of a row's repetitions: median {statistics.median(spread):.1%}, worst {max(spread):.1%}")
+    return 0
+
+
+if __name__ == "__main__":
+    sys.exit(main())
