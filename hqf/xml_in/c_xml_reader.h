@@ -180,6 +180,8 @@ private:
     // Elements of the model that are open, which the engine counts, and what it has read without the general path.
     unsigned int model_depth_ = 0;
     hqf::fast_trace trace_;
+    // Steps that the engine left to the general path, for a test: the speed of a load hangs on their being few.
+    unsigned int general_steps_ = 0;
 };
 
 inline c_xml_reader_local::c_xml_reader_local(c_xml_reader* reader)

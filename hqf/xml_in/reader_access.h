@@ -34,8 +34,11 @@ struct reader_access {
     /// What the fast path has read since the general path did; settle() hands it over.
     static fast_trace& trace(lmx::c_xml_reader& reader) { return reader.trace_; }
     static void settle(lmx::c_xml_reader& reader) {
+        ++reader.general_steps_;
         if (reader.trace_.kind != fast_trace::name_kind::none) settle_trace(reader);
     }
+    /// How often settle() was called: each time before an event of the general path.
+    static unsigned int general_steps(const lmx::c_xml_reader& reader) { return reader.general_steps_; }
     /// Whether the input is used up, be it by a fatal report.
     static bool is_at_end(lmx::c_xml_reader& reader) {
         const int c = reader.getter_.get();

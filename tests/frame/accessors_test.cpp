@@ -221,28 +221,26 @@ TEST(accessors, identities_and_factories) {
     EXPECT_FALSE(element.has_id(same_text.c_str())) << "identities are pointers";
     EXPECT_FALSE(element.has_id(SubstrateType::id));
 
+    const auto makes = []<class root>(root* (*factory)(int, const std::string&), int namespace_id, const char* name) {
+        return std::unique_ptr<root>(factory(namespace_id, name)) != nullptr;
+    };
     const struct {
-        const void* made;
+        bool made;
         bool expected;
         const char* what;
     } rows[] = {
-        {std::unique_ptr<ColorSpaceType>(ColorSpaceType::factory(1000, "ColorSpaceMunsellType")).get(), true, "a form"},
-        {std::unique_ptr<ColorSpaceType>(ColorSpaceType::factory(1000, "ColorSpaceType")).get(), false, "the root"},
-        {std::unique_ptr<ColorSpaceType>(ColorSpaceType::factory(1001, "ColorSpaceMunsellType")).get(), false,
-         "a namespace"},
-        {std::unique_ptr<FunctionType>(FunctionType::factory(1000, "FunctionDEcmcType")).get(), true, "other letters"},
-        {std::unique_ptr<FunctionType>(FunctionType::factory(1000, "FunctionType")).get(), false, "the head"},
-        {std::unique_ptr<ColorSpaceSpecificationSpectrumType>(
-             ColorSpaceSpecificationSpectrumType::factory(1000, "ColorSpaceSpecificationSpectrumType"))
-             .get(),
-         true, "a branch knows itself"},
-        {std::unique_ptr<ColorSpaceSpecificationSpectrumType>(
-             ColorSpaceSpecificationSpectrumType::factory(1000, "ColorSpaceSpecificationEmissiveType"))
-             .get(),
-         false, "and not the other"},
+        {makes(ColorSpaceType::factory, 1000, "ColorSpaceMunsellType"), true, "a form"},
+        {makes(ColorSpaceType::factory, 1000, "ColorSpaceType"), false, "the root"},
+        {makes(ColorSpaceType::factory, 1001, "ColorSpaceMunsellType"), false, "another namespace"},
+        {makes(FunctionType::factory, 1000, "FunctionDEcmcType"), true, "a type with other letters than its element"},
+        {makes(FunctionType::factory, 1000, "FunctionType"), false, "the head"},
+        {makes(ColorSpaceSpecificationSpectrumType::factory, 1000, "ColorSpaceSpecificationSpectrumType"), true,
+         "a branch knows itself"},
+        {makes(ColorSpaceSpecificationSpectrumType::factory, 1000, "ColorSpaceSpecificationEmissiveType"), false,
+         "and not the other"},
     };
     for (const auto& row : rows)
-        EXPECT_EQ(row.made != nullptr, row.expected) << row.what;
+        EXPECT_EQ(row.made, row.expected) << row.what;
 }
 
 TEST(accessors, copies_count_as_set) {
