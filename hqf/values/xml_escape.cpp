@@ -2,6 +2,10 @@
 
 #include <cstring>
 
+#if defined(__SSE2__)
+#include <emmintrin.h>
+#endif
+
 #include "hqf/values/transcode.h"
 
 namespace hqf {
@@ -56,9 +60,39 @@ void append(std::string& out, const character* data, std::size_t size) {
         out.append(buffer, write_xml_escaped(buffer, buffer + sizeof buffer, next, end));
 }
 
+#if defined(__SSE2__)
+
+/// Copies eight elements at a time as long as all of them are ASCII that stands for itself.
+char* copy_plain_runs(char* out, const char* limit, const wchar_t*& next, const wchar_t* end) {
+    static_assert(sizeof(wchar_t) == 4);
+    const auto load = [](const wchar_t* at) { return _mm_loadu_si128(reinterpret_cast<const __m128i*>(at)); };
+    const auto is = [](__m128i bytes, char c) { return _mm_cmpeq_epi8(bytes, _mm_set1_epi8(c)); };
+    while (end - next >= 8 && limit - out >= 8) {
+        // Packing keeps ASCII, and makes of everything else 0 or a byte above 127.
+        const __m128i words = _mm_packs_epi32(load(next), load(next + 4));
+        const __m128i bytes = _mm_packus_epi16(words, words);
+        const __m128i special = _mm_or_si128(_mm_or_si128(is(bytes, '"'), is(bytes, '\'')),
+                                             _mm_or_si128(_mm_or_si128(is(bytes, '&'), is(bytes, '<')), is(bytes, 0)));
+        if (_mm_movemask_epi8(_mm_or_si128(special, bytes)) != 0) break;
+        _mm_storel_epi64(reinterpret_cast<__m128i*>(out), bytes);
+        out += 8;
+        next += 8;
+    }
+    return out;
+}
+
+#else
+
+char* copy_plain_runs(char* out, const char*, const wchar_t*&, const wchar_t*) {
+    return out;
+}
+
+#endif
+
 } // namespace
 
 char* write_xml_escaped(char* out, const char* limit, const wchar_t*& next, const wchar_t* end) {
+    out = copy_plain_runs(out, limit, next, end);
     while (next != end && has_room(out, limit)) {
         char32_t c = to_character(*next++);
         if (c < 0x80) {
