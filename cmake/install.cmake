@@ -32,6 +32,7 @@ configure_file(${CMAKE_CURRENT_LIST_DIR}/hqf.pc.in ${PROJECT_BINARY_DIR}/hqf.pc 
 install(FILES ${PROJECT_BINARY_DIR}/hqf.pc DESTINATION ${CMAKE_INSTALL_LIBDIR}/pkgconfig)
 
 install(FILES ${PROJECT_SOURCE_DIR}/hqf/model/hqf-v2.xsd DESTINATION ${CMAKE_INSTALL_DATADIR}/hqf)
+install(FILES ${PROJECT_BINARY_DIR}/generated/docs/vocabulary.md DESTINATION ${CMAKE_INSTALL_DOCDIR})
 
 if(BUILD_TESTING)
   add_subdirectory(${PROJECT_SOURCE_DIR}/tests/install)

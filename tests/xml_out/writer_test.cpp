@@ -289,6 +289,43 @@ TEST(writer, text_of_values) {
         EXPECT_NE(text.find(expected), std::string::npos) << expected;
 }
 
+/// Whatever is special in a text is seen at every place, although plain text is written in wide steps.
+TEST(writer, escapes_at_every_place) {
+    const struct {
+        std::wstring text;
+        std::string expected;
+        bool ends = false;
+    } rows[] = {
+        {L"\"", "&quot;"},
+        {L"'", "&apos;"},
+        {L"&", "&amp;"},
+        {L"<", "&lt;"},
+        {L">", ">"},
+        {L"\n", "\n"},
+        {L"\xE9", "\xC3\xA9"},
+        {L"\x2028", "\xE2\x80\xA8"},
+        {L"\xFFFD", "\xEF\xBF\xBD"},
+        {L"\xD834\xDD1E", "\xF0\x9D\x84\x9E"},
+        {std::wstring(1, static_cast<wchar_t>(0x1D11E)), "\xF0\x9D\x84\x9E"},
+        {L"\xDC00", "\xED\xB0\x80"},
+        {std::wstring(1, L'\0'), std::string(1, '\0')},
+        {L"\xD834", "", true},
+    };
+    for (const auto& row : rows)
+        for (std::size_t before = 0; before < 20; ++before)
+            for (const std::size_t behind : {std::size_t{0}, std::size_t{1}, std::size_t{17}}) {
+                hqf_v2::Person person;
+                person.set_Name(std::wstring(before, L'a') + row.text + std::wstring(behind, L'z'));
+                std::ostringstream stream;
+                c_xml_writer writer(stream, "", "");
+                ASSERT_EQ(person.marshal(writer, "p"), 0);
+                const std::string text =
+                    std::string(before, 'a') + row.expected + std::string(row.ends ? 0 : behind, 'z');
+                EXPECT_EQ(stream.str(), "<p><Hqf:Name>" + text + "</Hqf:Name></p>")
+                    << row.expected << " behind " << before;
+            }
+}
+
 TEST(writer, incomplete_elements) {
     using namespace hqf_v2;
     std::string out = "as it was";

@@ -54,7 +54,7 @@ inline std::uint32_t crc_of(const std::string& bytes) {
 inline std::string deflated(const std::string& bytes) {
     std::string packed(bytes.size() + 100, '\0');
     z_stream stream{};
-    deflateInit2(&stream, 9, Z_DEFLATED, -15, 8, Z_DEFAULT_STRATEGY);
+    deflateInit2(&stream, Z_DEFAULT_COMPRESSION, Z_DEFLATED, -15, 8, Z_DEFAULT_STRATEGY);
     stream.next_in = reinterpret_cast<Bytef*>(const_cast<char*>(bytes.data()));
     stream.avail_in = static_cast<uInt>(bytes.size());
     stream.next_out = reinterpret_cast<Bytef*>(packed.data());
@@ -86,7 +86,7 @@ struct entry {
         , size(static_cast<std::uint32_t>(content.size())) {}
 
     std::string name = "a.hqf";
-    std::uint16_t made_by = 46, flags = 0, method;
+    std::uint16_t made_by = 46, flags = 0, method, time = 0x4800, date = 0x58A1; // 2024-05-01 09:00:00
     std::string data, behind_data, local_extra, extra, comment;
     std::uint32_t crc, packed_size, size, external = 0x81B40020;
     std::uint32_t shift = 0; ///< added to the offset that the directory tells
@@ -105,7 +105,7 @@ inline archive build(const std::vector<entry>& entries, const std::string& comme
     for (const entry& e : entries) {
         const auto offset = static_cast<std::uint32_t>(made.bytes.size());
         hqf::field_writer fields, local, central;
-        fields(std::uint16_t{20})(e.flags)(e.method)(std::uint16_t{0x4800})(std::uint16_t{0x58A1});
+        fields(std::uint16_t{20})(e.flags)(e.method)(e.time)(e.date);
         fields(e.crc)(e.packed_size)(e.size)(size16(e.name));
         local(0x04034B50U).bytes(fields.get().data(), fields.get().size())(size16(e.local_extra));
         made.bytes += local.get() + e.name + e.local_extra + e.data + e.behind_data;

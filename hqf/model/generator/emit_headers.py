@@ -95,6 +95,8 @@ class _Header:
         if cls.form == "group":
             self.group()
         self.marshalling()
+        if self.lines[-1]:
+            self.add()
         self.lines.append("private:")
         self.add("template <class model_class>")
         self.add("friend struct hqf::frame::rows_of;")
@@ -136,7 +138,8 @@ class _Header:
 
     def life_cycle(self) -> None:
         cls, name = self.cls, self.cls.name
-        self.add()
+        if self.lines[-1] != "public:":
+            self.add()
         if cls.document:
             self.doc("A document that holds the library's identity in ReadSDKInformation and nothing else.")
         elif cls.form in ("choice", "group"):
@@ -395,10 +398,11 @@ class _Header:
         if cls.document:
             self.document()
         if cls.form == "group":
-            self.lines.append("protected:")
+            self.lines += ["", "protected:"]
             self.add("lmx::elmx_error marshal_child_elements(lmx::c_xml_writer& writer);")
+            self.add()
         elif cls.form != "element" or cls.nillable:
-            self.lines.append("protected:")
+            self.lines += ["", "protected:"]
             self.add("void marshal_attributes(lmx::c_xml_writer& writer) const;")
             self.add("lmx::elmx_error marshal_child_elements(lmx::c_xml_writer& writer);")
             self.add("bool unmarshal_attributes(lmx::c_xml_reader& reader, const std::string& attribute, "

@@ -12,6 +12,7 @@ from pathlib import Path
 from cpp_names import NOTICE
 from emit_classes import class_bodies
 from emit_headers import class_header
+from emit_reference import reference_page
 from emit_tables import tables_header, tables_source
 from vocabulary import Vocabulary, load
 from xsd import SchemaError
@@ -24,6 +25,7 @@ def generate(vocabulary: Vocabulary) -> dict[str, str]:
     files["hqf/model/classes.h"] = f"{NOTICE}/// All model classes.\n#pragma once\n\n{includes}\n"
     files["hqf/model/tables.h"] = tables_header(vocabulary)
     files["hqf/model/tables.cpp"] = tables_source(vocabulary)
+    files["docs/vocabulary.md"] = reference_page(vocabulary)
     for part in dict.fromkeys(cls.part for cls in vocabulary.classes.values()):
         files[f"hqf/model/classes_{part}.cpp"] = class_bodies(vocabulary, part)
     return files
