@@ -87,11 +87,16 @@ void copy_row(const row& r, void* to, const void* from) {
         member_at<value_type>(to, r.value) = member_at<value_type>(from, r.value);
     });
     if (is_pointer(r.what)) {
-        const void* source = member_at<void*>(from, r.value);
+        const void* const source = member_at<void*>(from, r.value);
+        void* copy = nullptr;
         if (source != nullptr)
-            member_at<void*>(to, r.value) = r.type->clone(source);
+            copy = r.type->clone(source);
         else if (r.has(mandatory_row))
-            member_at<void*>(to, r.value) = r.type->create();
+            copy = r.type->create();
+        // A new document has its stamp already.
+        void*& target = member_at<void*>(to, r.value);
+        if (target != nullptr) r.type->destroy(target);
+        target = copy;
     } else if (!is_value) {
         copy_members(*r.type, &member_at<char>(to, r.value), &member_at<char>(from, r.value));
     }

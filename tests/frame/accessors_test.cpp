@@ -264,6 +264,11 @@ TEST(accessors, copies_count_as_set) {
     filter.set_DeviceFilterType(L"Filter_UVD65");
     EXPECT_TRUE(filter.isnil_DeviceFilter()) << "the base's setter knows no flag";
 
+    Hqf unstamped;
+    unstamped.get_Preamble().get_Header().unset_ReadSDKInformation();
+    EXPECT_FALSE(Hqf(unstamped).get_Preamble().get_Header().isset_ReadSDKInformation())
+        << "a copy has no stamp of its own";
+
     SDKVersion version;
     version.setnil_SDKVersion();
     EXPECT_TRUE(version.is_occurs_ok());
