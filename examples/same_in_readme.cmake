@@ -1,0 +1,10 @@
+# Fails unless the lines of EXAMPLE between "README begin" and "README end" stand, without their indent, in README.
+file(READ ${EXAMPLE} example)
+file(READ ${README} readme)
+string(REGEX REPLACE "^.*// README begin\n(.*)    // README end.*$" "\\1" shown "${example}")
+string(REPLACE "\n    " "\n" shown "\n${shown}")
+string(SUBSTRING "${shown}" 1 -1 shown)
+string(FIND "${readme}" "${shown}" place)
+if(shown STREQUAL example OR place EQUAL -1)
+  message(FATAL_ERROR "README.md does not show this:\n${shown}")
+endif()
