@@ -202,18 +202,18 @@ TEST_P(other_programs, open_what_is_written) {
 INSTANTIATE_TEST_SUITE_P(
     archives, other_programs,
     testing::Values(
-        program{"unzip", R"(test "$(unzip -Z1 "$ARCHIVE")" = a.hqf && unzip -tqq "$ARCHIVE" &&
-                            unzip -p "$ARCHIVE" | cmp - "$PLAIN")"},
-        program{"bsdtar", R"(test "$(bsdtar -tf "$ARCHIVE")" = a.hqf && bsdtar -xOf "$ARCHIVE" | cmp - "$PLAIN")"},
-        program{"7z", R"(7z t "$ARCHIVE" >/dev/null && 7z e -so "$ARCHIVE" a.hqf | cmp - "$PLAIN")"},
-        program{"python3", R"(python3 -c 'if True:
+        program{"unzip", R"sh(test "$(unzip -Z1 "$ARCHIVE")" = a.hqf && unzip -tqq "$ARCHIVE" &&
+                            unzip -p "$ARCHIVE" | cmp - "$PLAIN")sh"},
+        program{"bsdtar", R"sh(test "$(bsdtar -tf "$ARCHIVE")" = a.hqf && bsdtar -xOf "$ARCHIVE" | cmp - "$PLAIN")sh"},
+        program{"7z", R"sh(7z t "$ARCHIVE" >/dev/null && 7z e -so "$ARCHIVE" a.hqf | cmp - "$PLAIN")sh"},
+        program{"python3", R"sh(python3 -c 'if True:
             import os, zipfile
             archive = zipfile.ZipFile(os.environ["ARCHIVE"])
             (entry,) = archive.infolist()
             assert archive.testzip() is None
             assert (entry.filename, entry.compress_type) == ("a.hqf", zipfile.ZIP_DEFLATED)
             assert archive.comment == entry.comment == entry.extra == b""
-            assert archive.read(entry) == open(os.environ["PLAIN"], "rb").read()')"}),
-    [](const auto& info) { return "with_" + std::string(info.param.name); });
+            assert archive.read(entry) == open(os.environ["PLAIN"], "rb").read()')sh"}),
+    [](const auto& each) { return "with_" + std::string(each.param.name); });
 
 } // namespace

@@ -2,7 +2,7 @@
 
 #include <gtest/gtest.h>
 
-#include <cstring>
+#include <map>
 
 #include "tests/document/support.h"
 #include "tests/support/documents.h"
@@ -43,42 +43,22 @@ bool is_write_stamped(const hqf_v2::Hqf& document) {
 }
 
 TEST(write_file, suffix_decides) {
-    const struct {
-        const char* name;
-        int code;
-        const char* file; // the one that is there afterwards
-        const char* why;
-    } rows[] = {
-        {"a.hqf", 0, "a.hqf", "plain XML"},
-        {".hqf", 0, ".hqf", "an empty stem is one, too"},
-        {"a.hqfz.hqf", 0, "a.hqfz.hqf", "the end counts"},
-        {"a.hqfz", 0, "a.hqfz", "an archive, and its XML file is gone"},
-        {"Grün-\xE4\xB8\xAD-\xF0\x9D\x84\x9E.hqf", 0, "Grün-\xE4\xB8\xAD-\xF0\x9D\x84\x9E.hqf",
-         "a path of any letters"},
-        {"a.HQF", 1001, nullptr, "capitals are another suffix"},
-        {"a.HQFZ", 1001, nullptr, "in archives, too"},
-        {"a.xml", 1001, nullptr, "neither suffix"},
-        {"a.hqf ", 1001, nullptr, "a blank belongs to the name"},
-        {"a.hqfzz", 1001, nullptr, "longer than a suffix"},
-        {"hqf", 1001, nullptr, "no point"},
-        {"a", 1001, nullptr, "no suffix"},
-        {"none/a.hqf", 1, nullptr, "no such folder"},
-        {"none/a.hqfz", 1, nullptr, "the archive's XML file stands beside it"},
-    };
-    for (const auto& row : rows) {
+    // The end of the name counts, capitals are another suffix, and an archive's XML file stands beside it.
+    const std::map<std::string, int> names = {{"a.hqf", 0},      {".hqf", 0},       {"a.hqfz.hqf", 0}, {"a.hqfz", 0},
+                                              {"中-𝄞.hqf", 0},   {"a.HQF", 1001},   {"a.HQFZ", 1001},  {"a.xml", 1001},
+                                              {"a.hqf ", 1001},  {"a.hqfzz", 1001}, {"hqf", 1001},     {"a", 1001},
+                                              {"none/a.hqf", 1}, {"none/a.hqfz", 1}};
+    for (const auto& [name, code] : names) {
         const folder place;
-        hqf_v2::Hqf document;
+        hqf_v2::Hqf document, again;
         fill_header(document);
-        EXPECT_EQ(document.writeFile(wide(place / row.name)), row.code) << row.why;
-        EXPECT_EQ(place.size(), row.file ? 1u : 0u) << row.why;
-        EXPECT_EQ(is_write_stamped(document), row.code == 0) << row.why << ": no stamp before the file is open";
-        if (!row.file) continue;
-        EXPECT_TRUE(std::filesystem::exists(place / row.file)) << row.why;
-        const bool plain = row.file[std::strlen(row.file) - 1] == 'f';
-        EXPECT_EQ(bytes_of(place / row.file) == smallest, plain) << row.why;
-        hqf_v2::Hqf again;
-        EXPECT_EQ(again.loadFile(wide(place / row.file)), 0) << row.why;
-        EXPECT_TRUE(hqf::equal(document, again)) << row.why;
+        EXPECT_EQ(document.writeFile(wide(place / name)), code) << name;
+        EXPECT_EQ(place.size(), code == 0 ? 1u : 0u) << name;
+        EXPECT_EQ(is_write_stamped(document), code == 0) << name << ": no stamp before the file is open";
+        if (code != 0) continue;
+        EXPECT_EQ(bytes_of(place / name) == smallest, name.back() == 'f') << name;
+        EXPECT_EQ(again.loadFile(wide(place / name)), 0) << name;
+        EXPECT_TRUE(hqf::equal(document, again)) << name;
     }
     for (const wchar_t* path : {L"", L"f", L"hqfz"})
         EXPECT_EQ(hqf_v2::Hqf().writeFile(path), 1001) << "shorter";
@@ -106,32 +86,24 @@ TEST(write_file, failures_leave_no_file) {
     // A disk without room, reached by a link: never name the device itself, since the file is deleted.
     if (!std::filesystem::exists("/dev/full")) GTEST_SKIP() << "no /dev/full";
     long_one.clear_ColorQualityControl();
-    for (const bool by_path : {true, false}) {
-        std::filesystem::create_symlink("/dev/full", place / "full.hqf");
-        EXPECT_EQ(by_path ? long_one.writeFile(wide(place / "full.hqf"))
-                          : long_one.marshal((place / "full.hqf").c_str()),
-                  42);
-        EXPECT_FALSE(std::filesystem::is_symlink(place / "full.hqf"));
-    }
-    hqf_v2::Hqf small;
+    hqf_v2::Hqf small; // smaller than the stream's buffer
     fill_header(small);
-    std::filesystem::create_symlink("/dev/full", place / "full.hqf");
-    EXPECT_EQ(small.writeFile(wide(place / "full.hqf")), 42) << "smaller than the stream's buffer";
-    EXPECT_TRUE(std::filesystem::exists("/dev/full"));
+    for (hqf_v2::Hqf* const document : {&long_one, &small})
+        for (const bool by_path : {true, false}) {
+            const auto path = place / "full.hqf";
+            std::filesystem::create_symlink("/dev/full", path);
+            EXPECT_EQ(by_path ? document->writeFile(wide(path)) : document->marshal(path.c_str()), 42);
+            EXPECT_FALSE(std::filesystem::is_symlink(path));
+        }
 }
 
 TEST(load_file, any_name_but_an_archive_s_is_xml) {
     const folder place;
-    const struct {
-        const char* name;
-        int code;
-    } rows[] = {{"a.hqf", 0},      {"a.txt", 0}, {"a.HQFZ", 0},
-                {"a.hqfz.bak", 0}, {"a", 0},     {"\xC3\xA9\xF0\x9D\x84\x9E", 0}};
-    for (const auto& row : rows) {
-        make_file(place / row.name, smallest);
-        EXPECT_EQ(hqf_v2::Hqf().loadFile(wide(place / row.name)), row.code) << row.name;
-        std::filesystem::remove(place / row.name);
-        EXPECT_EQ(hqf_v2::Hqf().loadFile(wide(place / row.name)), 1) << row.name << " is gone";
+    for (const std::string name : {"a.hqf", "a.txt", "a.HQFZ", "a.hqfz.bak", "a", "é𝄞"}) {
+        make_file(place / name, smallest);
+        EXPECT_EQ(hqf_v2::Hqf().loadFile(wide(place / name)), 0) << name;
+        std::filesystem::remove(place / name);
+        EXPECT_EQ(hqf_v2::Hqf().loadFile(wide(place / name)), 1) << name << " is gone";
     }
     EXPECT_EQ(hqf_v2::Hqf().loadFile(L""), 1);
     EXPECT_EQ(hqf_v2::Hqf().unmarshal(""), 1) << "a narrow path";
@@ -141,7 +113,8 @@ TEST(load_file, any_name_but_an_archive_s_is_xml) {
 }
 
 TEST(load_string, codes_of_the_root) {
-    const std::string preamble = "<Hqf:Preamble>";
+    const std::string other_prefix =
+        replaced(smallest, "<Hqf:Hqf xmlns:Hqf", "<x:Hqf xmlns:x='http://hqf.example/v2' xmlns:Hqf");
     const struct {
         std::string text;
         int code;
@@ -152,21 +125,14 @@ TEST(load_string, codes_of_the_root) {
         {replaced(smallest, "<Hqf:Hqf ", "<Hqf:Hqf xsi:schemaLocation='a b' xsi:type='x' "), 0, "xsi attributes"},
         {replaced(smallest, "<Hqf:Hqf ", "<Hqf:Hqf Comments='x' "), 39, "the root has no attributes"},
         {replaced(smallest, "//hqf.example/v2", "//hqf.example/v3"), 16, "another namespace"},
-        {replaced(replaced(smallest, "<Hqf:Hqf xmlns:Hqf", "<x:Hqf xmlns:x='http://hqf.example/v2' xmlns:Hqf"),
-                  "</Hqf:Hqf>", "</x:Hqf>"),
-         0, "another prefix for the root"},
-        {replaced(replaced(smallest, "<Hqf:Hqf xmlns:Hqf", "<x:Hqf xmlns:x='http://hqf.example/v2' xmlns:Hqf"),
-                  "</Hqf:Hqf>", "</Hqf:Hqf>"),
-         10, "an end tag spelled another way"},
-        {"<Hqf xmlns='http://hqf.example/v1'/>", 16, "a default namespace of another URI"},
+        {replaced(other_prefix, "</Hqf:Hqf>", "</x:Hqf>"), 0, "another prefix for the root"},
+        {other_prefix, 10, "an end tag spelled another way"},
         {"<Hqf/>", 16, "no namespace"},
         {"<Hqf:Hqf/>", 16, "nobody declares the prefix"},
         {"<Hqf xmlns='http://hqf.example/v2'/>", 32, "an empty root"},
         {"", 34, "nothing"},
-        {"<!-- nothing -->", 34, "nothing but a comment"},
         {replaced(smallest, "T09:00:00Z", "T09:00:00"), 22, "no time zone"},
-        {replaced(smallest, "T09:00:00Z", "T09:00:00+00:00"), 0, "a zone of no offset"},
-        {replaced(smallest, preamble, "<Hqf:Color/>" + preamble), 21, "Preamble isn't first"},
+        {replaced(smallest, "<Hqf:Preamble>", "<Hqf:Color/><Hqf:Preamble>"), 21, "Preamble isn't first"},
     };
     for (const auto& row : rows)
         EXPECT_EQ(hqf_v2::Hqf().loadString(wide(row.text)), row.code) << row.why;
@@ -184,8 +150,7 @@ TEST(stamps, where_they_come_from_and_go) {
     EXPECT_FALSE(is_write_stamped(document));
 
     const auto failed = document.writeString();
-    EXPECT_EQ(failed.getElmxError(), 46);
-    EXPECT_EQ(failed.getXmlDocument(), L"");
+    EXPECT_TRUE(failed.getElmxError() == 46 && failed.getXmlDocument().empty());
     EXPECT_TRUE(is_write_stamped(document)) << "a failed write stamps";
     document.reset();
     EXPECT_FALSE(is_write_stamped(document));
@@ -232,19 +197,6 @@ TEST(load, appends_and_keeps_what_was_read) {
     EXPECT_EQ(part.unmarshal(replaced(smallest, "tests", "later")), 0);
     EXPECT_EQ(part.get_Preamble().get_Header().get_Creator(), L"later");
     EXPECT_EQ(part.size_Color(), once.size_Color());
-}
-
-TEST(write_string, wide_text_of_any_character) {
-    hqf_v2::Hqf document, again;
-    fill_header(document);
-    const std::wstring name = L"\xE9 \x4E2D \xD834\xDD1E < & > \" '";
-    document.get_Preamble().get_Header().set_Name(name);
-    const auto result = document.writeString();
-    ASSERT_EQ(result.getElmxError(), 0);
-    EXPECT_NE(result.getXmlDocument().find(L"<Hqf:Name>\xE9 \x4E2D \xD834\xDD1E &lt; &amp; > &quot; &apos;</Hqf:Name>"),
-              std::wstring::npos);
-    EXPECT_EQ(again.loadString(result.getXmlDocument()), 0);
-    EXPECT_EQ(again.get_Preamble().get_Header().get_Name(), name);
 }
 
 } // namespace

@@ -44,30 +44,25 @@ TEST(samples, sound_documents_round_trip) {
         make_file(file, text);
         hqf_v2::Hqf from_file, from_text, from_archive;
         EXPECT_EQ(from_file.loadFile(wide(file)), 0) << name;
-        EXPECT_TRUE(written(from_file) == text) << name;
         EXPECT_EQ(from_file.writeFile(wide(copy)), 0) << name;
         EXPECT_TRUE(bytes_of(copy) == text) << name;
         EXPECT_EQ(from_text.loadString(wide(text)), 0) << name;
-        const auto result = from_text.writeString();
-        EXPECT_EQ(result.getElmxError(), 0) << name;
-        EXPECT_TRUE(result.getXmlDocument() == wide(text)) << name;
+        EXPECT_TRUE(from_text.writeString().getXmlDocument() == wide(text)) << name;
         EXPECT_EQ(from_text.writeFile(wide(archive)), 0) << name;
         EXPECT_EQ(from_archive.loadFile(wide(archive)), 0) << name;
-        EXPECT_TRUE(hqf::equal(from_file, from_archive)) << name;
+        EXPECT_TRUE(written(from_archive) == text) << name;
     }
 }
 
 TEST(samples, spellings_of_one_document) {
-    const std::set<std::string> unicode = {"character-references", "unicode", "utf16be",
-                                           "utf16be-bom",          "utf16le", "utf16le-bom"};
     const auto documents = support::documents("syntax");
     EXPECT_EQ(documents.size(), 25u);
     for (const auto& [path, text] : documents) {
         const std::string name = path.substr(7, path.size() - 11);
         hqf_v2::Hqf document;
         EXPECT_EQ(document.unmarshal(text), 0) << name;
-        EXPECT_EQ(written(document), support::document(unicode.count(name) ? "syntax/unicode.hqf" : "syntax/plain.hqf"))
-            << name;
+        const bool unicode = name == "character-references" || name == "unicode" || name.rfind("utf16", 0) == 0;
+        EXPECT_EQ(written(document), support::document(unicode ? "syntax/unicode.hqf" : "syntax/plain.hqf")) << name;
     }
 }
 

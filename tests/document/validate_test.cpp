@@ -7,7 +7,6 @@
 #include <cstdio>
 #include <iterator>
 #include <map>
-#include <set>
 
 #include "tests/document/support.h"
 #include "tests/model/corpus.h"
@@ -30,49 +29,33 @@ std::map<std::string, bool> validate(const std::map<std::string, std::string>& d
         list += (place / name).string() + '\n';
     }
     make_file(place / "list", list);
-    const std::string command =
-        "xargs -n 500 " HQF_XMLLINT " --noout --schema " HQF_SCHEMA " < '" + (place / "list").string() + "' 2>&1";
+    const std::string command = "xargs -d '\\n' -n 500 " HQF_XMLLINT " --noout --schema " HQF_SCHEMA " < '" +
+                                (place / "list").string() + "' 2>&1";
     std::map<std::string, bool> result;
     std::FILE* const pipe = popen(command.c_str(), "r");
     char line[4096];
     while (pipe != nullptr && std::fgets(line, sizeof line, pipe) != nullptr) {
         const std::string text(line);
-        for (const auto& [end, valid] :
-             {std::pair<std::string, bool>(" validates\n", true), {" fails to validate\n", false}})
-            if (ends_with(text, end)) {
-                const std::string path = text.substr(0, text.size() - end.size());
-                result[path.substr(path.rfind('/') + 1)] = valid;
-            }
+        const bool valid = ends_with(text, " validates\n");
+        if (!valid && !ends_with(text, " fails to validate\n")) continue;
+        const std::string path = text.substr(0, text.rfind(valid ? " validates" : " fails"));
+        result[path.substr(path.rfind('/') + 1)] = valid;
     }
     if (pipe != nullptr) pclose(pipe);
     return result;
 }
 
-class validation : public testing::Test {
-protected:
-    void SetUp() override {
-        if (*HQF_XMLLINT == '\0') GTEST_SKIP() << "no xmllint (package libxml2-utils)";
-    }
-};
+/// Ends of the names of corpus cases that load, and are written as what the schema refuses: dates are digits to the
+/// library, and no calendar has this one; and 14 digits round some values onto their open bounds.
+const char* const exceptions[] = {"'2024-02-30T10:00:00Z'", "H '359.99999999999994'", "Hue '359.99999999999994'",
+                                  "ReflectancePointType: body '-0.9999999999999999'",
+                                  "ReflectancePointType: body '9.999999999999998'"};
 
-/// Ends of the names of corpus cases that load, and are written as what the schema refuses.
-const struct {
-    const char* end;
-    const char* why;
-} exceptions[] = {
-    {"'2024-02-30T10:00:00Z'", "dates are digits to the library, and no calendar has this one"},
-    {"H '359.99999999999994'", "14 digits round it onto its open bound"},
-    {"Hue '359.99999999999994'", "the same"},
-    {"ReflectancePointType: body '-0.9999999999999999'", "the same"},
-    {"ReflectancePointType: body '9.999999999999998'", "the same"},
-};
-
-TEST_F(validation, what_is_written_is_valid) {
-    const std::set<std::string_view> families = {"sound",         "nil",    "choice",   "group",
-                                                 "literal",       "bound",  "wildcard", "attribute missing",
-                                                 "unknown child", "length", "twice"};
-    std::map<std::string, std::string> documents;
-    std::map<std::string, std::string> names;
+TEST(validation, what_is_written_is_valid) {
+    if (*HQF_XMLLINT == '\0') GTEST_SKIP() << "no xmllint (package libxml2-utils)";
+    const std::string families = ",sound,nil,choice,group,literal,bound,wildcard,"
+                                 "attribute missing,unknown child,length,twice,";
+    std::map<std::string, std::string> documents, names;
     const auto add = [&](const std::string& name, std::string_view text) {
         hqf_v2::Hqf document;
         ASSERT_EQ(document.unmarshal(std::string(text)), 0) << name;
@@ -85,93 +68,59 @@ TEST_F(validation, what_is_written_is_valid) {
             add(name, text);
     const std::string bytes = corpus::bytes();
     for (const corpus::test_case& test : corpus::cases(bytes))
-        if (test.code == 0 && test.write == "0" && families.count(test.family))
+        if (test.code == 0 && test.write == "0" &&
+            families.find("," + std::string(test.family) + ",") != std::string::npos)
             add(std::string(test.family) + ", " + std::string(test.what), test.document);
     const auto found = validate(documents);
     EXPECT_EQ(found.size(), documents.size()) << "xmllint didn't judge all";
     for (const auto& [number, valid] : found) {
         const std::string& name = names[number];
-        const auto* const exception = std::find_if(std::begin(exceptions), std::end(exceptions),
-                                                   [&](const auto& each) { return ends_with(name, each.end); });
-        EXPECT_EQ(valid, exception == std::end(exceptions)) << name << '\n' << documents[number];
+        const bool excepted = std::any_of(std::begin(exceptions), std::end(exceptions),
+                                          [&](const char* end) { return ends_with(name, end); });
+        EXPECT_EQ(valid, !excepted) << name << '\n' << documents[number];
     }
 }
 
-/// A palette with a device, and a quality-control record.
-struct whole {
-    hqf_v2::Hqf document;
-    hqf_v2::ColorSpaceSpecificationSpectrumGenericType& specification() {
-        return document.get_Palette(0)
-            .get_CollectionColorSpaceSpecification()
-            .get_ColorSpaceSpecificationSpectrumGeneric();
-    }
-    hqf_v2::DeviceSettings& settings() { return specification().get_Device().get_DeviceSettings(); }
-    hqf_v2::ColorQualityControlType& control() { return document.get_ColorQualityControl(0); }
-
-    whole() {
-        const lmx::c_datetime date("2024-05-01T09:00:00Z");
-        fill_header(document);
-        document.get_Palette(0).set_PaletteName(L"p");
-        document.get_Palette(0).append_ChangeHistory(date);
-        auto& made = specification();
-        made.get_DeviceFilter().setnil_DeviceFilter();
-        made.get_DevicePolarization().set_DevicePolarization(false);
-        made.append_ChangeHistory(date);
-        made.get_Spectrum().set_SpectrumType(L"Spectrum_Reflectance");
-        auto& device = made.get_Device();
-        device.set_Manufacturer(L"");
-        device.set_Model(L"");
-        device.set_SerialNumber(L"");
-        settings().get_Averaging().set_AveragingValue(2);
-        settings().get_Averaging().set_Averaging(true);
-        control().append_ChangeHistory(date);
-        control().append_StandardAndMeasurement();
-        control().back_StandardAndMeasurement().get_Standard().setnil_Standard();
-        auto& target = control().get_PhysicalSample().get_Sample().get_SampleTarget();
-        target.get_Substrate().get_SubstratePaper();
-        target.set_Target(L"Target_Custom");
-        control().append_Tolerance();
-        control().back_Tolerance().get_Function().get_FunctionDE();
-    }
-};
-
-TEST_F(validation, what_the_interface_lets_through) {
+TEST(validation, what_the_interface_lets_through) {
+    if (*HQF_XMLLINT == '\0') GTEST_SKIP() << "no xmllint (package libxml2-utils)";
+    using hqf_v2::Hqf;
+    static const auto settings = [](Hqf& d) -> hqf_v2::DeviceSettings& {
+        auto& space = d.get_Color(0).get_ColorSpace(0).get_ColorSpaceRecipe();
+        return space.get_ColorSpaceSpecificationSpectrumGeneric().get_Device().get_DeviceSettings();
+    };
+    static const auto function = [](Hqf & d) -> auto& {
+        d.get_ColorQualityControl(0).append_Tolerance();
+        return d.get_ColorQualityControl(0).back_Tolerance().get_Function();
+    };
+    static const auto add_date = [](Hqf& d, const lmx::c_datetime& date) {
+        d.get_ColorQualityControl(0).append_ChangeHistory(date);
+    };
     const struct {
         const char* name;
         bool valid;
-        void (*edit)(whole&);
-        const char* why;
+        void (*edit)(Hqf&);
     } rows[] = {
-        {"whole", true, [](whole&) {}, "all others are this one with one change"},
-        {"aperture-1", true, [](whole& w) { w.settings().set_Aperture(1); }, "inside"},
-        {"aperture-0", false, [](whole& w) { w.settings().set_Aperture(0); }, "the setter has no minimum"},
-        {"temperature-0", false, [](whole& w) { w.specification().get_IlluminationOptions().set_ColorTemperature(0); },
-         "nor has this one"},
-        {"unset-body", false, [](whole& w) { w.settings().get_Averaging().unset_Averaging(); },
-         "a body that may be unset is written empty, and empty is no boolean"},
-        {"plain-function", false, [](whole& w) { w.control().back_Tolerance().get_Function().get_Function(); },
-         "the head of the group is abstract and names no type"},
-        {"typed-function", true,
-         [](whole& w) { w.control().back_Tolerance().get_Function().assign_Function(new hqf_v2::FunctionDEType); },
-         "with a type it is as good as any"},
-        {"empty-date", false, [](whole& w) { w.control().append_ChangeHistory(lmx::c_datetime()); },
-         "list setters check nothing"},
-        {"no-such-day", false,
-         [](whole& w) { w.control().append_ChangeHistory(lmx::c_datetime("2024-02-30T10:00:00Z")); },
-         "dates are digits to the library"},
-        {"no-zone", false, [](whole& w) { w.control().append_ChangeHistory(lmx::c_datetime("2024-05-01T10:00:00")); },
-         "the writer asks for no zone"},
+        {"all others are this one with one change", true, [](Hqf&) {}},
+        {"no minimum of an aperture", false, [](Hqf& d) { settings(d).set_Aperture(0); }},
+        {"a body that may be unset is written empty", false,
+         [](Hqf& d) { settings(d).get_Averaging().unset_Averaging(); }},
+        {"an abstract head that names no type", false, [](Hqf& d) { function(d).get_Function(); }},
+        {"the head with a type", true, [](Hqf& d) { function(d).assign_Function(new hqf_v2::FunctionDEType); }},
+        {"an empty date", false, [](Hqf& d) { add_date(d, lmx::c_datetime()); }},
+        {"no such day", false, [](Hqf& d) { add_date(d, "2024-02-30T10:00:00Z"); }},
+        {"no zone", false, [](Hqf& d) { add_date(d, "2024-05-01T10:00:00"); }},
     };
     std::map<std::string, std::string> documents;
     for (const auto& row : rows) {
-        whole edited;
-        row.edit(edited);
-        documents[row.name] = written(edited.document);
+        Hqf document;
+        ASSERT_EQ(document.unmarshal(support::document("documents/everything.hqf")), 0);
+        row.edit(document);
+        documents[row.name] = written(document);
     }
     const auto found = validate(documents);
     for (const auto& row : rows) {
-        ASSERT_TRUE(found.count(row.name)) << row.name << " wasn't judged:\n" << documents[row.name];
-        EXPECT_EQ(found.at(row.name), row.valid) << row.name << ": " << row.why << '\n' << documents[row.name];
+        ASSERT_TRUE(found.count(row.name)) << row.name << " wasn't judged";
+        EXPECT_EQ(found.at(row.name), row.valid) << row.name;
     }
 }
 

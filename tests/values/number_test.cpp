@@ -1,7 +1,5 @@
 // Numbers from text and into text, held against the C library and the streams.
 
-#include <gtest/gtest.h>
-
 #include <bit>
 #include <cmath>
 #include <cstdio>
@@ -9,15 +7,16 @@
 #include <iomanip>
 #include <limits>
 #include <random>
-#include <sstream>
-#include <string>
 
 #include "hqf/values/c_as_xml.h"
 #include "hqf/values/lexical.h"
 #include "hqf/values/number_text.h"
 #include "hqf/values/to_number.h"
+#include "tests/values/table.h"
 
 namespace {
+
+using values_test::rows, values_test::words;
 
 constexpr double inf = std::numeric_limits<double>::infinity();
 
@@ -29,11 +28,7 @@ bool same(double a, double b) {
 // must agree with it to the bit; on all other text the tolerant form must.
 void expect_as_strtod(const std::string& text) {
     double value = 42;
-    const bool named = text == "INF" || text == "-INF" || text == "NaN";
-    const double expected = named ? (text == "INF"    ? inf
-                                     : text == "-INF" ? -inf
-                                                      : std::nan(""))
-                                  : std::atof(text.c_str());
+    const double expected = std::atof(text.c_str());
     const bool read = hqf::read_double(text.data(), text.data() + text.size(), value);
     EXPECT_EQ(read, lmx::is_valid_float(text)) << text;
     EXPECT_TRUE(same(value, read ? expected : 42)) << text << " gave " << value;
@@ -41,63 +36,29 @@ void expect_as_strtod(const std::string& text) {
 }
 
 TEST(read_double, hard_cases_as_strtod) {
-    const std::string nines(400, '9');
-    const std::string zeros(400, '0');
-    const std::string texts[] = {
-        "0", "-0", "-0.0", "+0", "-0e99999", "1.", ".5", "-.5", "+1E-2", "00000000000000000000001.50", "INF", "-INF",
-        "NaN",
-        // the last integer that is exact, the first that isn't, halfway cases
-        "9007199254740992", "9007199254740993", "9007199254740993.0000000000000000000001", "9007199254740994.9999",
-        // 19 and 20 digits, 22 and 23 powers of ten
-        "1234567890123456789", "12345678901234567890", "1e22", "1e23", "9007199254740991e22", "123e-22", "123e-23",
-        "8.5e-22", "0.30000000000000004", "5e-1", "6.02214076e23", "1.7976931348623157e308", "1.7976931348623159e308",
-        // denormal numbers, the halfway point to the smallest, and far beyond on both sides
-        "2.2250738585072011e-308", "4.9e-324", "2.4703282292062327e-324", "2.4703282292062328e-324", "1e-400",
-        "-1e-400", "1e400", "-1e400", "1e99999999999999999999", "1e-99999999999999999999", "0e99999999999999999999",
-        "0." + zeros + "1e401", "0." + zeros + "1e9", nines, nines + "e-400", nines + "." + nines + "e-99",
-        "1" + zeros + "e-400", "1" + zeros + "e-800"};
+    const std::string nines(400, '9'), zeros(400, '0');
+    // Exact integers and the first that isn't, halfway cases, 19 and 20 digits, 22 and 23 powers of ten, denormal
+    // numbers, the halfway point to the smallest, and far beyond on both sides.
+    auto texts = words(R"(
+        0 -0 -0.0 +0 -0e99999 1. .5 -.5 +1E-2 00000000000000000000001.50 INF -INF NaN 9007199254740992 9007199254740993
+        9007199254740993.0000000000000000000001 9007199254740994.9999 1234567890123456789 12345678901234567890 1e22
+        1e23 9007199254740991e22 123e-22 123e-23 8.5e-22 0.30000000000000004 5e-1 6.02214076e23 1.7976931348623157e308
+        1.7976931348623159e308 2.2250738585072011e-308 4.9e-324 2.4703282292062327e-324 2.4703282292062328e-324 1e-400
+        -1e-400 1e400 -1e400 1e99999999999999999999 1e-99999999999999999999 0e99999999999999999999)");
+    for (const auto& text : {"0." + zeros + "1e401", "0." + zeros + "1e9", nines, nines + "e-400",
+                             nines + "." + nines + "e-99", "1" + zeros + "e-400", "1" + zeros + "e-800"})
+        texts.push_back(text);
     for (const auto& text : texts)
         expect_as_strtod(text);
 }
 
 TEST(to_double, failed_text_as_atof_in_the_c_locale) {
-    for (const char* text : {"",
-                             " ",
-                             ".",
-                             "-",
-                             "+",
-                             "--5",
-                             "+-5",
-                             "-+5",
-                             " \t\n\v\f\r-1.5x",
-                             "1e",
-                             "1e+",
-                             "1e-x",
-                             "1.5.5",
-                             "1,5",
-                             ".e1",
-                             "abc",
-                             "inf",
-                             "-Infinity",
-                             "+INF",
-                             "infx",
-                             "nan",
-                             "nan(12)",
-                             "0x",
-                             "0xg",
-                             "0x.p1",
-                             "0x1p3",
-                             "-0X1.8P+1",
-                             "0x.8",
-                             "0x1p99999",
-                             "0x1p-99999",
-                             "0x0.0001p1020",
-                             "0x0.0000000000000001p1080",
-                             "0x10000000000000000p1000",
-                             "1e400x",
-                             "\xA0"
-                             "5",
-                             "5\xA0"})
+    for (const auto& text : words(R"(
+        '' _ . - + --5 +-5 -+5 __-1.5x 1e 1e+ 1e-x 1.5.5 1,5 .e1 abc inf -Infinity +INF infx nan nan(12) 0x 0xg 0x.p1
+        0x1p3 -0X1.8P+1 0x.8 0x1p99999 0x1p-99999 0x0.0001p1020 0x0.0000000000000001p1080 0x10000000000000000p1000
+        1e400x)"))
+        expect_as_strtod(text);
+    for (const char* text : {" \t\n\v\f\r-1.5x", "\xA0\x35", "5\xA0"})
         expect_as_strtod(text);
     EXPECT_EQ(hqf::to_double(std::string_view("12345", 2)), 12.0) << "a span ends where it ends";
 }
@@ -122,80 +83,40 @@ TEST(read_double, random_texts_as_strtod) {
 }
 
 TEST(scan_double, takes_the_longest_form) {
-    const struct {
-        const char* text;
-        int size; // -1: none begins
-        double value;
-    } rows[] = {{"1.5<", 3, 1.5}, {"1e<", 1, 1},     {"1e+<", 1, 1}, {"1.e5x", 4, 1e5}, {"-INFx", 4, -inf},
-                {"1..", 2, 1},    {"<", -1, 42},     {"-<", -1, 42}, {".<", -1, 42},    {"NaN", 3, std::nan("")},
-                {"-NaN", -1, 42}, {"5e-3e", 4, .005}};
-    for (const auto& row : rows) {
+    for (const auto& [text, size, expected] : rows<3>(R"(
+        1.5< 3 1.5   1e< 1 1   1e+< 1 1   1.e5x 4 1e5   -INFx 4 -inf   1.. 2 1   NaN 3 nan   5e-3e 4 .005
+        < -1 42   -< -1 42   .< -1 42   -NaN -1 42)")) {
         double value = 42;
-        const char* const end = hqf::scan_double(row.text, row.text + std::string(row.text).size(), value);
-        EXPECT_EQ(end == nullptr ? -1 : static_cast<int>(end - row.text), row.size) << row.text;
-        EXPECT_TRUE(same(value, row.value)) << row.text << " gave " << value;
+        const char* const end = hqf::scan_double(text.data(), text.data() + text.size(), value);
+        EXPECT_EQ(end == nullptr ? -1 : end - text.data(), std::stol(size)) << text;
+        EXPECT_TRUE(same(value, std::stod(expected))) << text << " gave " << value;
     }
 }
 
 TEST(integers, as_atoi_and_strtoul) {
-    for (const std::string text : {"0",
-                                   "-0",
-                                   "+7",
-                                   "007",
-                                   "-12",
-                                   " \t\v12x",
-                                   "x",
-                                   "",
-                                   "-",
-                                   "+-1",
-                                   "12.9",
-                                   "2147483647",
-                                   "2147483648",
-                                   "-2147483649",
-                                   "4294967295",
-                                   "4294967296",
-                                   "-4294967295",
-                                   "9223372036854775807",
-                                   "9223372036854775808",
-                                   "-9223372036854775808",
-                                   "-9223372036854775809",
-                                   "18446744073709551615",
-                                   "18446744073709551616",
-                                   "-18446744073709551615",
-                                   "99999999999999999999999",
-                                   "-99999999999999999999999"}) {
+    for (const auto& text : words(R"(
+        0 -0 +7 007 -12 __12x x '' - +-1 12.9 2147483647 2147483648 -2147483649 4294967295 4294967296 -4294967295
+        9223372036854775807 9223372036854775808 -9223372036854775808 -9223372036854775809 18446744073709551615
+        18446744073709551616 99999999999999999999999 -99999999999999999999999)")) {
         EXPECT_EQ(hqf::to_int(text), std::atoi(text.c_str())) << text;
         EXPECT_EQ(hqf::to_unsigned(text), static_cast<unsigned int>(std::strtoul(text.c_str(), nullptr, 10))) << text;
     }
-    const struct {
-        const char* text;
-        bool read;
-        std::int64_t value;
-    } rows[] = {{"12", true, 12},
-                {"-007", true, -7},
-                {"+999999999999999999", true, 999999999999999999},
-                {"9999999999999999999", false, 42},
-                {"", false, 42},
-                {"-", false, 42},
-                {"1 ", false, 42},
-                {"1.0", false, 42}};
-    for (const auto& row : rows) {
+    for (const auto& [text, expected] : rows<2>(R"(
+        12 12   -007 -7   +999999999999999999 999999999999999999   9999999999999999999 42   '' 42   - 42   1_ 42
+        1.0 42)")) {
         std::int64_t value = 42;
-        EXPECT_EQ(hqf::read_short_integer(row.text, row.text + std::string(row.text).size(), value), row.read)
-            << row.text;
-        EXPECT_EQ(value, row.value) << row.text;
+        EXPECT_EQ(hqf::read_short_integer(text.data(), text.data() + text.size(), value), expected != "42") << text;
+        EXPECT_EQ(value, std::stol(expected)) << text;
     }
 }
 
 TEST(booleans, true_and_1_are_true) {
-    for (const std::string text : {"true", "1", "false", "0", "TRUE", "yes", "", "11"}) {
+    for (const auto& text : words("true 1 false 0 TRUE yes '' 11")) {
         const bool expected = text == "true" || text == "1";
         bool value = !expected;
         EXPECT_EQ(hqf::to_bool(text), expected) << text;
-        if (hqf::read_bool(text.data(), text.data() + text.size(), value)) {
-            EXPECT_EQ(value, expected) << text;
-        }
-        EXPECT_EQ(value == expected, lmx::is_valid_bool(text)) << text;
+        const bool read = hqf::read_bool(text.data(), text.data() + text.size(), value);
+        EXPECT_TRUE(read == lmx::is_valid_bool(text) && (value == expected) == read) << text;
     }
 }
 
@@ -213,45 +134,17 @@ std::string written(number value) {
 }
 
 TEST(c_as_xml, numbers) {
-    const struct {
-        double value;
-        const char* text;
-    } rows[] = {{0.0, "0.0"},
-                {-0.0, "-0.0"},
-                {inf, "INF"},
-                {-inf, "-INF"},
-                {std::nan(""), "NaN"},
-                {-std::nan(""), "NaN"},
-                {1, "1"},
-                {0.1, "0.1"},
-                {-12.25, "-12.25"},
-                {1.0 / 3, "0.33333333333333"},
-                {100.0 / 3, "33.333333333333"},
-                {12345678901234567.0, "1.2345678901235e+16"},
-                {99999999999999.0, "99999999999999"},
-                {100000000000000.0, "1e+14"},
-                {0.0001, "0.0001"},
-                {0.00001234, "1.234e-05"},
-                {0.30000000000000004, "0.3"},
-                {9.9999999999999, "9.9999999999999"},
-                {9.99999999999996, "10"}};
-    for (const auto& row : rows) {
-        EXPECT_EQ(inserted(row.value), row.text);
-        EXPECT_EQ(written(row.value), row.text);
+    for (const auto& [value, text] : rows<2>(R"(
+        0 0.0   -0.0 -0.0   inf INF   -inf -INF   nan NaN   -nan NaN   1 1   0.1 0.1   -12.25 -12.25
+        0.33333333333333333 0.33333333333333   33.333333333333333 33.333333333333
+        12345678901234567 1.2345678901235e+16   99999999999999 99999999999999   1e14 1e+14   1e-4 0.0001
+        0.00001234 1.234e-05   0.30000000000000004 0.3   9.9999999999999 9.9999999999999   9.99999999999996 10)")) {
+        EXPECT_EQ(inserted(std::stod(value)), text);
+        EXPECT_EQ(written(std::stod(value)), text);
     }
-    EXPECT_EQ(inserted(0.1f), "0.1");
-    EXPECT_EQ(inserted(1.0f / 3), "0.3333333");
-    EXPECT_EQ(inserted(-0.0f), "-0.0");
-    EXPECT_EQ(written(123456789), "123456789");
-    EXPECT_EQ(written(std::numeric_limits<int>::min()), "-2147483648");
-    EXPECT_EQ(written(4294967295u), "4294967295");
-}
-
-TEST(c_as_xml, booleans) {
-    std::ostringstream os;
-    os << std::noboolalpha << lmx::c_as_xml(true) << lmx::c_as_xml(false) << std::boolalpha
-       << lmx::c_as_bool_digit(true) << lmx::c_as_bool_digit(false);
-    EXPECT_EQ(os.str(), "truefalse10");
+    EXPECT_EQ(inserted(0.1f) + inserted(1.0f / 3) + inserted(-0.0f), "0.10.3333333-0.0");
+    EXPECT_EQ(written(123456789) + written(std::numeric_limits<int>::min()) + written(4294967295u),
+              "123456789-21474836484294967295");
 }
 
 TEST(c_as_xml, precision_is_put_back_and_flags_are_the_streams) {
@@ -259,6 +152,10 @@ TEST(c_as_xml, precision_is_put_back_and_flags_are_the_streams) {
     os << std::setprecision(3) << lmx::c_as_xml(1.0 / 3) << ' ' << 1.0 / 3 << ' ' << std::fixed << lmx::c_as_xml(0.5f)
        << std::showpos << ' ' << lmx::c_as_xml(1e-7) << ' ' << 0.5;
     EXPECT_EQ(os.str(), "0.33333333333333 0.333 0.5000000 +0.00000010000000 +0.500");
+    os.str("");
+    os << std::noboolalpha << lmx::c_as_xml(true) << lmx::c_as_xml(false) << std::boolalpha
+       << lmx::c_as_bool_digit(true) << lmx::c_as_bool_digit(false);
+    EXPECT_EQ(os.str(), "truefalse10");
 }
 
 TEST(write_number, as_the_stream_on_random_numbers) {
@@ -283,25 +180,20 @@ TEST(has_default_format, notices_whatever_changes_a_number) {
         char do_thousands_sep() const override { return '\''; }
         std::string do_grouping() const override { return "\3"; }
     };
-    const struct {
-        void (*change)(std::ostream&);
-        bool is_default;
-        const char* why;
-    } rows[] = {{[](std::ostream&) {}, true, "a fresh stream"},
-                {[](std::ostream& os) { os << std::hex; }, false, "base"},
-                {[](std::ostream& os) { os << std::fixed; }, false, "float format"},
-                {[](std::ostream& os) { os << std::showpos; }, false, "sign"},
-                {[](std::ostream& os) { os << std::uppercase; }, false, "case"},
-                {[](std::ostream& os) { os << std::left; }, false, "side of the padding"},
-                {[](std::ostream& os) { os << std::setprecision(5); }, false, "precision"},
-                {[](std::ostream& os) { os << std::setw(5); }, false, "width"},
-                {[](std::ostream& os) { os.imbue(std::locale(std::locale::classic(), new grouped)); }, false, "locale"},
-                {[](std::ostream& os) { os << std::boolalpha << std::setfill('x'); }, true, "what numbers don't heed"}};
-    for (const auto& row : rows) {
+    for (const auto flag : {std::ios::hex, std::ios::fixed, std::ios::showpos, std::ios::uppercase, std::ios::left}) {
         std::ostringstream os;
-        row.change(os);
-        EXPECT_EQ(hqf::has_default_format(os), row.is_default) << row.why;
+        os.setf(flag);
+        EXPECT_FALSE(hqf::has_default_format(os)) << flag;
     }
+    std::ostringstream precise, padded, local, heedless;
+    precise << std::setprecision(5);
+    padded << std::setw(5);
+    local.imbue(std::locale(std::locale::classic(), new grouped));
+    heedless << std::boolalpha << std::setfill('x');
+    EXPECT_FALSE(hqf::has_default_format(precise));
+    EXPECT_FALSE(hqf::has_default_format(padded));
+    EXPECT_FALSE(hqf::has_default_format(local));
+    EXPECT_TRUE(hqf::has_default_format(heedless));
 }
 
 } // namespace

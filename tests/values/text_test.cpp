@@ -1,16 +1,14 @@
 // UTF-8 and UTF-16: conversions, single characters, and the escapes of documents.
 
-#include <gtest/gtest.h>
-
+#include <algorithm>
 #include <iomanip>
-#include <sstream>
-#include <string>
 
 #include "hqf/platform/paths.h"
 #include "hqf/values/c_as_xml.h"
 #include "hqf/values/text.h"
 #include "hqf/values/transcode.h"
 #include "hqf/values/xml_escape.h"
+#include "tests/values/table.h"
 
 namespace {
 
@@ -24,34 +22,24 @@ const std::wstring low = {wchar_t(0xDD1E)};
 
 // Each row also runs behind ASCII of every length up to 17, which moves it through every step of the word-wise scan.
 TEST(convert, utf8_to_wide) {
-    const struct {
+    struct row {
         std::string in;
         std::wstring out;
-        const char* why;
-    } rows[] = {{"", L"", "nothing"},
-                {"a\x7F", L"a\x7F", "ASCII up to its end"},
-                {std::string("a\0b", 3), std::wstring(L"a\0b", 3), "NUL is a character"},
-                {"\xC2\x80\xDF\xBF", {wchar_t(0x80), wchar_t(0x7FF)}, "two bytes"},
-                {"\xE0\xA0\x80\xEF\xBF\xBF", {wchar_t(0x800), wchar_t(0xFFFF)}, "three bytes"},
-                {clef8 + "x", clef16 + L"x", "four bytes give a pair"},
-                {split_clef8 + "x", clef16 + L"x", "a pair in six bytes"},
-                {"\xED\xB4\x9Ex", low + L"x", "a lone low surrogate is kept"},
-                {"a\xED\xA0\xB4x", L"a", "a high surrogate without its low one ends it"},
-                {"a\xED\xA0\xB4", L"a", "a pending high surrogate is dropped"},
-                {"a\xED\xA0\xB4" + clef8, L"a", "a pair of its own is no low surrogate"},
-                {"\xC0\xAF", L"/", "overlong forms pass"},
-                {"a\xC3", L"a", "lead byte at the end"},
-                {"a\xE2\x82", L"a", "three bytes cut off"},
-                {"a\xF0\x9D\x84", L"a", "four bytes cut off"},
-                {"a\xC3(b", L"a", "missing continuation"},
-                {"a\xE2\x82(b", L"a", "missing third byte"},
-                {"a\x80z", L"a", "continuation without lead"},
-                {"a\xF8\x88\x80\x80\x80z", L"a", "five-byte lead"}};
+    };
+    // A split pair is a pair, a lone low surrogate is kept, overlong forms pass. A high surrogate without its low one
+    // ends the text, as does whatever is no character.
+    const auto rows = values_test::list(
+        row{"", L""}, row{"a\x7F", L"a\x7F"}, row{std::string("a\0b", 3), std::wstring(L"a\0b", 3)},
+        row{"\xC2\x80\xDF\xBF", L"\x80\x7FF"}, row{"\xE0\xA0\x80\xEF\xBF\xBF", L"\x800\xFFFF"},
+        row{clef8 + "x", clef16 + L"x"}, row{split_clef8 + "x", clef16 + L"x"}, row{"\xED\xB4\x9Ex", low + L"x"},
+        row{"\xC0\xAF", L"/"}, row{"a\xED\xA0\xB4x", L"a"}, row{"a\xED\xA0\xB4", L"a"},
+        row{"a\xED\xA0\xB4" + clef8, L"a"}, row{"a\xC3", L"a"}, row{"a\xE2\x82", L"a"}, row{"a\xF0\x9D\x84", L"a"},
+        row{"a\xC3(b", L"a"}, row{"a\xE2\x82(b", L"a"}, row{"a\x80z", L"a"}, row{"a\xF8\x88\x80\x80\x80z", L"a"});
     for (const auto& row : rows)
         for (std::size_t prefix = 0; prefix < 18; ++prefix) {
             std::wstring out = L"old";
             EXPECT_EQ(&convert(&out, std::string(prefix, '.') + row.in), &out);
-            EXPECT_EQ(out, std::wstring(prefix, L'.') + row.out) << row.why << " behind " << prefix;
+            EXPECT_EQ(out, std::wstring(prefix, L'.') + row.out) << row.in << " behind " << prefix;
         }
     std::string narrow = "old";
     EXPECT_EQ(vtostring(narrow, "a\xC3"), "a\xC3") << "the narrow form is a plain copy";
@@ -61,37 +49,32 @@ TEST(convert, utf8_to_wide) {
 }
 
 TEST(convert, wide_to_utf8_and_escaped) {
-    const struct {
+    struct row {
         std::wstring in;
         std::string plain, escaped;
-        const char* why;
-    } rows[] = {
-        {L"", "", "", "nothing"},
-        {L"a>b&c<'\"", "a>b&c<'\"", "a>b&amp;c&lt;&apos;&quot;", "the four escapes, and > as it is"},
-        {{wchar_t(0x7F), wchar_t(0x80), wchar_t(0x7FF)}, "\x7F\xC2\x80\xDF\xBF", "\x7F\xC2\x80\xDF\xBF", "two bytes"},
-        {{wchar_t(0x800), wchar_t(0xFFFF)}, "\xE0\xA0\x80\xEF\xBF\xBF", "\xE0\xA0\x80\xEF\xBF\xBF", "three bytes"},
-        {clef16 + L"x", clef8 + "x", clef8 + "x", "a pair is joined"},
-        {L"a" + high + L"Ab",
-         "a\xED\xA0\xB4"
-         "b",
-         "a", "unpaired high: the next element is lost, escaping ends"},
-        {L"a" + high, "a\xED\xA0\xB4", "a", "unpaired high at the end"},
-        {L"a" + high + clef16, "a\xED\xA0\xB4\xED\xB4\x9E", "a", "high before a pair swallows its first half"},
-        {low + L"&", "\xED\xB4\x9E&", "\xED\xB4\x9E&amp;", "a lone low surrogate"},
-        {{wchar_t(0x1D11E), L'x'}, clef8 + "x", clef8 + "x", "one 32-bit element"},
-        {{wchar_t(0x110000), L'x'}, "\xEF\xBF\xBDx", "\xEF\xBF\xBDx", "no character at all"},
-        {{wchar_t(0xFFFFFF3C), L'x'}, "\xEF\xBF\xBDx", "\xEF\xBF\xBDx", "its low byte is a less-than sign"}};
+    };
+    // An unpaired high surrogate loses the next element, and ends the escaping. What is no character is replaced, even
+    // if its low byte is a less-than sign.
+    const auto rows = values_test::list(
+        row{L"", "", ""}, row{L"a>b&c<'\"", "a>b&c<'\"", "a>b&amp;c&lt;&apos;&quot;"},
+        row{L"\x7F\x80\x7FF", "\x7F\xC2\x80\xDF\xBF", "\x7F\xC2\x80\xDF\xBF"},
+        row{L"\x800\xFFFF", "\xE0\xA0\x80\xEF\xBF\xBF", "\xE0\xA0\x80\xEF\xBF\xBF"},
+        row{clef16 + L"x", clef8 + "x", clef8 + "x"}, row{L"a" + high + L"Az", "a\xED\xA0\xB4z", "a"},
+        row{L"a" + high, "a\xED\xA0\xB4", "a"}, row{L"a" + high + clef16, "a\xED\xA0\xB4\xED\xB4\x9E", "a"},
+        row{low + L"&", "\xED\xB4\x9E&", "\xED\xB4\x9E&amp;"}, row{{wchar_t(0x1D11E), L'x'}, clef8 + "x", clef8 + "x"},
+        row{{wchar_t(0x110000), L'x'}, "\xEF\xBF\xBDx", "\xEF\xBF\xBDx"},
+        row{{wchar_t(0xFFFFFF3C), L'x'}, "\xEF\xBF\xBDx", "\xEF\xBF\xBDx"});
     for (const auto& row : rows) {
         std::string out = "old";
-        EXPECT_EQ(convert(&out, row.in), row.plain) << row.why;
+        EXPECT_EQ(convert(&out, row.in), row.plain) << row.plain;
         for (const std::size_t prefix : {0u, 1u, 505u, 506u, 507u, 512u, 1100u}) { // around the size of a block
             std::ostringstream os;
             const std::wstring in = std::wstring(prefix, L'.') + row.in;
             os << c_as_xml(in);
-            EXPECT_EQ(os.str(), std::string(prefix, '.') + row.escaped) << row.why << " behind " << prefix;
+            EXPECT_EQ(os.str(), std::string(prefix, '.') + row.escaped) << row.plain << " behind " << prefix;
             std::string appended = "kept";
             hqf::append_xml_escaped(appended, in.data(), in.size());
-            EXPECT_EQ(appended, "kept" + os.str()) << row.why;
+            EXPECT_EQ(appended, "kept" + os.str()) << row.plain;
         }
     }
 }
@@ -101,14 +84,12 @@ TEST(c_as_xml, narrow_text) {
     std::string expected = "a>b&amp;c&quot;&apos;&lt;\xFF";
     for (int i = 0; i < 600; ++i)
         expected += "&amp;";
-    std::ostringstream xml, escaped;
-    xml << std::setw(5) << c_as_xml(in);
-    escaped << c_as_escaped<std::string>(in);
-    EXPECT_EQ(xml.str(), expected);
-    EXPECT_EQ(escaped.str(), expected);
-    std::string appended;
+    std::ostringstream os;
+    os << c_as_escaped<std::string>(in) << std::setw(5) << c_as_xml(in);
+    EXPECT_EQ(os.str(), expected + expected);
+    std::string appended = "kept";
     hqf::append_xml_escaped(appended, in.data(), in.size());
-    EXPECT_EQ(appended, expected);
+    EXPECT_EQ(appended, "kept" + expected);
 }
 
 TEST(c_as_ascii, everything_above_ascii_is_a_point) {
@@ -117,47 +98,29 @@ TEST(c_as_ascii, everything_above_ascii_is_a_point) {
     EXPECT_EQ(os.str(), "a&\x7F.....");
 }
 
-TEST(unicode_char_to_utf8, bounds_of_each_length) {
-    const struct {
-        int c;
-        const char* out;
-    } rows[] = {{0x41, "A"},
-                {0x7F, "\x7F"},
-                {0x80, "\xC2\x80"},
-                {0x7FF, "\xDF\xBF"},
-                {0x800, "\xE0\xA0\x80"},
-                {0xD834, "\xED\xA0\xB4"},
-                {0xFFFF, "\xEF\xBF\xBF"},
-                {0x10000, "\xF0\x90\x80\x80"},
-                {0x10FFFF, "\xF4\x8F\xBF\xBF"},
-                {-1, "\xFF"}};
-    for (const auto& row : rows) {
-        char out[5] = {'?', '?', '?', '?', '?'};
-        EXPECT_EQ(unicode_char_to_utf8(row.c, out), out);
-        EXPECT_STREQ(out, row.out) << row.c;
-    }
-}
-
-TEST(utf8_to_unicode_char, value_or_what_was_built) {
-    const struct {
-        const char* in;
+TEST(utf8_to_unicode_char, and_back) {
+    struct row {
+        const char* utf8;
         bool ok;
-        int value;
-        const char* why;
-    } rows[] = {{"A", true, 0x41, "one byte"},
-                {"\xDF\xBF", true, 0x7FF, "two"},
-                {"\xED\xA0\xB4", true, 0xD834, "three"},
-                {"\xF4\x8F\xBF\xBF", true, 0x10FFFF, "four"},
-                {"\xC3(", false, 3, "no second byte"},
-                {"\xE2\x82(", false, 0x82, "no third"},
-                {"\xF0", false, 0, "NUL is no continuation"},
-                {"\x80", false, -1, "continuation first"},
-                {"\xF8\x88\x80\x80\x80", false, -1, "five bytes"}};
+        int value; // or what was built before the fault
+    };
+    const auto rows = values_test::list(row{"\x7F", true, 0x7F}, row{"\xC2\x80", true, 0x80},
+                                        row{"\xDF\xBF", true, 0x7FF}, row{"\xE0\xA0\x80", true, 0x800},
+                                        row{"\xED\xA0\xB4", true, 0xD834}, row{"\xEF\xBF\xBF", true, 0xFFFF},
+                                        row{"\xF0\x90\x80\x80", true, 0x10000}, row{"\xF4\x8F\xBF\xBF", true, 0x10FFFF},
+                                        row{"\xC3(", false, 3}, row{"\xE2\x82(", false, 0x82}, row{"\xF0", false, 0},
+                                        row{"\x80", false, -1}, row{"\xF8\x88\x80\x80\x80", false, -1});
+    char out[5];
     for (const auto& row : rows) {
         int value = 99;
-        EXPECT_EQ(utf8_to_unicode_char(row.in, &value), row.ok) << row.why;
-        EXPECT_EQ(value, row.value) << row.why;
+        EXPECT_EQ(utf8_to_unicode_char(row.utf8, &value), row.ok) << row.utf8;
+        EXPECT_EQ(value, row.value) << row.utf8;
+        if (!row.ok) continue;
+        std::fill(out, out + 5, '?');
+        EXPECT_EQ(unicode_char_to_utf8(row.value, out), out);
+        EXPECT_STREQ(out, row.utf8);
     }
+    EXPECT_STREQ(unicode_char_to_utf8(-1, out), "\xFF");
 }
 
 TEST(is_valid_utf8_char_sequence, first_two_bytes_decide) {

@@ -1,15 +1,17 @@
 #include "support.h"
 
 #include "hqf/values/text.h"
-#include "hqf/xml_in/c_get_with_entities.h"
 #include "hqf/xml_in/c_read_file.h"
 #include "hqf/xml_in/c_read_string.h"
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
+
 namespace {
 
 using namespace xml_in_test;
+using namespace std::string_literals;
 
 std::string read_all(lmx::c_read& source) {
     std::string out;
@@ -23,23 +25,17 @@ TEST(byte_source, gives_every_byte_and_the_same_again_after_rewind) {
         std::string bytes;
         for (std::size_t i = 0; i < size; ++i)
             bytes += static_cast<char>(255 - i % 256);
-        const auto check = [&](lmx::c_read& source, const char* kind) {
+        const driver read_thrice = [&](lmx::c_read& source) {
             for (const std::size_t part : {std::size_t{0}, size / 3, size}) {
                 source.rewind();
                 for (std::size_t i = 0; i < part; ++i)
                     source.read();
                 source.rewind();
-                EXPECT_EQ(read_all(source), bytes) << kind << " of " << size << ", rewound after " << part;
-                EXPECT_EQ(source.read(), -1) << kind << " stays at its end";
+                if (read_all(source) != bytes || source.read() != -1) return "rewound after " + std::to_string(part);
             }
+            return bytes;
         };
-        lmx::c_read_memory memory(bytes.data(), static_cast<unsigned int>(size));
-        check(memory, "memory");
-        lmx::c_read_string string(bytes);
-        check(string, "string");
-        const temporary_file on_disk(bytes);
-        lmx::c_read_file file(on_disk.path.c_str());
-        check(file, "file");
+        given{read_thrice}.from_every_source({{bytes, bytes, std::to_string(size) + " bytes"}});
     }
 }
 
@@ -59,117 +55,216 @@ TEST(byte_source, a_missing_file_is_not_open_and_reads_as_ended) {
     EXPECT_FALSE(file.is_open());
     EXPECT_EQ(file.read(), -1);
     EXPECT_STREQ(file.get_source_id(), "/nowhere/at all.hqf");
-    lmx::c_read_file wide(L"/nowhere/\xD834\xDD1E\xE9");
-    EXPECT_STREQ(wide.get_source_id(), "/nowhere/\xED\xA0\xB4\xED\xB4\x9E\xC3\xA9") << "each unit by itself";
+    EXPECT_STREQ(lmx::c_read_file(L"/nowhere/\xD834\xDD1E\xE9").get_source_id(),
+                 "/nowhere/\xED\xA0\xB4\xED\xB4\x9E\xC3\xA9")
+        << "each unit by itself";
 }
 
-TEST(byte_source, what_the_block_holds_is_still_read_after_close) {
+TEST(byte_source, files_by_wide_path_and_by_handle) {
     const temporary_file on_disk(std::string(1000, 'x'));
-    lmx::c_read_file file(on_disk.path.c_str());
-    file.read();
-    file.close();
-    EXPECT_FALSE(file.is_open());
-    EXPECT_EQ(read_all(file).size(), 511u);
-}
-
-TEST(byte_source, a_wide_path_opens_the_file_of_its_utf8_name) {
-    const temporary_file on_disk("wide");
     std::wstring path;
-    lmx::c_read_file file(lmx::convert(&path, on_disk.path).c_str());
-    EXPECT_EQ(read_all(file), "wide");
-}
-
-TEST(byte_source, an_open_handle_is_taken_over_unless_told_otherwise) {
-    const temporary_file on_disk("handle");
+    lmx::c_read_file wide(lmx::convert(&path, on_disk.path).c_str());
+    wide.read();
+    wide.close();
+    EXPECT_FALSE(wide.is_open());
+    EXPECT_EQ(read_all(wide).size(), 511u) << "what the block holds is still read after close";
     std::FILE* const handle = std::fopen(on_disk.path.c_str(), "rb");
     {
         lmx::c_read_file file(handle);
         EXPECT_STREQ(file.get_source_id(), "");
-        EXPECT_EQ(file.read(), 'h');
+        EXPECT_EQ(file.read(), 'x');
         file.leave_file_open_on_delete(true);
     }
     std::rewind(handle);
-    EXPECT_EQ(std::fgetc(handle), 'h') << "left open";
+    EXPECT_EQ(std::fgetc(handle), 'x') << "left open";
     std::fclose(handle);
 }
 
 TEST(unget, gives_characters_back_in_reverse_order_and_counts_no_line_twice) {
-    const std::string bytes = "<a\nb";
-    lmx::c_read_string source(bytes);
-    recorder errors;
-    lmx::c_get_as_utf8 getter(source, errors);
-    for (int i = 0; i < 3; ++i)
-        getter.get();
-    EXPECT_EQ(getter.get_line_num(), 2);
-    getter.unget('\n');
-    getter.unget('a');
-    getter.unget('<');
+    reading<lmx::c_get_as_utf8> r("<a\nb"s);
+    for (const char c : {'<', 'a', '\n'})
+        EXPECT_EQ(r.in.get(), c);
+    for (const char c : {'\n', 'a', '<'})
+        r.in.unget(c);
     for (const char c : {'<', 'a', '\n', 'b'})
-        EXPECT_EQ(getter.get(), c);
-    EXPECT_EQ(getter.get_line_num(), 2);
-    getter.unget('b');
-    getter.error(lmx::error_fatal, lmx::err_not_well_formed, "stop");
-    EXPECT_EQ(getter.get(), -1) << "a fatal report ends the input, characters given back included";
+        EXPECT_EQ(r.in.get(), c);
+    EXPECT_EQ(r.in.get_line_num(), 2);
+    r.in.unget('b');
+    r.in.error(lmx::error_fatal, lmx::err_not_well_formed, "stop");
+    EXPECT_EQ(r.in.get(), -1) << "a fatal report ends the input, characters given back included";
 }
 
 TEST(entity_stream, values_come_in_place_of_the_document) {
-    const std::string bytes = "<\ndoc";
-    lmx::c_read_string source(bytes);
-    recorder errors;
-    lmx::c_get_with_entities getter(source, errors);
+    reading<lmx::c_get_with_entities> r("<\ndoc"s);
+    const char* value = nullptr;
     const auto push = [&](const char* name) {
-        const char* value = nullptr;
-        EXPECT_TRUE(getter.get_general_entity(name, &value)) << name;
-        return getter.set_input_entity_value(value);
+        return r.in.get_general_entity(name, &value) && r.in.set_input_entity_value(value);
     };
-    const auto next = [&](int count) {
-        std::string out;
-        while (count-- > 0)
-            out += static_cast<char>(getter.get());
+    const auto next = [&](std::size_t count) {
+        std::string out(count, ' ');
+        std::generate(out.begin(), out.end(), [&] { return static_cast<char>(r.in.get()); });
         return out;
     };
-    getter.add_general_entity("a", "old");
-    getter.add_general_entity("a", "1\r\n2");
-    getter.add_general_entity("b", "1\r\n2");
+    r.in.add_general_entity("a", "old");
+    r.in.add_general_entity("a", "1\r\n2");
+    r.in.add_general_entity("b", "1\r\n2");
     EXPECT_EQ(next(2), "<\n");
     EXPECT_TRUE(push("a"));
     EXPECT_EQ(next(1), "1") << "the later definition is read";
     EXPECT_TRUE(push("b")) << "an equal text is another entity";
-    EXPECT_EQ(getter.get_entity_stack_depth(), 2u);
     EXPECT_EQ(next(3), "1\r\n") << "line ends of a value are not folded";
-    getter.unget('\n');
+    r.in.unget('\n');
     EXPECT_EQ(next(2), "\n2");
-    EXPECT_EQ(getter.get_entity_stack_depth(), 2u) << "a value counts until the read behind it";
-    EXPECT_EQ(getter.get_line_num(), 2) << "and counts no lines";
+    EXPECT_EQ(r.in.get_entity_stack_depth(), 2u) << "a value counts until the read behind it";
+    EXPECT_EQ(r.in.get_line_num(), 2) << "and counts no lines";
     EXPECT_EQ(next(1), "\r");
-    EXPECT_EQ(getter.get_entity_stack_depth(), 1u);
+    EXPECT_EQ(r.in.get_entity_stack_depth(), 1u);
     EXPECT_FALSE(push("a")) << "it is being read";
-    EXPECT_EQ(errors.reports, " {0 9 Recursive entity definition for: 1\r\n2}");
+    EXPECT_EQ(r.errors.reports, " {0 9 Recursive entity definition for: 1\r\n2}");
     EXPECT_EQ(next(2), "\n2") << "what was begun is read to its end";
-    EXPECT_EQ(getter.get(), -1) << "then the fatal report shows";
-    const char* value = nullptr;
-    getter.rewind();
-    EXPECT_FALSE(getter.get_general_entity("a", &value)) << "rewinding forgets entities";
+    EXPECT_EQ(r.in.get(), -1) << "then the fatal report shows";
+    r.in.rewind();
+    EXPECT_FALSE(r.in.get_general_entity("a", &value)) << "rewinding forgets entities";
 }
 
 TEST(repository, is_an_ordered_list_also_where_it_is_long) {
     for (const int count : {3, 40}) {
         lmx::c_repository<int> numbers;
-        EXPECT_TRUE(numbers.empty());
         for (int i = 0; i < count; ++i)
             numbers.add(("k" + std::to_string(i)).c_str(), 7);
         EXPECT_STREQ(numbers.find_key(7), "k0") << "the first key of a value";
         numbers.add("k0", 8);
         EXPECT_STREQ(numbers.find_key(7), "k1");
         int value = 0;
-        EXPECT_TRUE(numbers.find("k0", &value));
-        EXPECT_EQ(value, 8) << "the last definition wins";
-        EXPECT_TRUE(numbers.find(("k" + std::to_string(count - 1)).c_str(), &value));
-        EXPECT_FALSE(numbers.has_key("k"));
+        EXPECT_TRUE(numbers.find("k0", &value) && value == 8) << "the last definition wins";
+        EXPECT_TRUE(numbers.has_key(("k" + std::to_string(count - 1)).c_str()) && !numbers.has_key("k"));
         EXPECT_EQ(numbers.find_key(9), nullptr);
         numbers.clear();
-        EXPECT_FALSE(numbers.has_key("k1"));
+        EXPECT_TRUE(numbers.empty() && !numbers.has_key("k1"));
     }
+}
+
+const std::string unrecognised = " {0 6 Unrecognised character encoding}";
+
+std::string decoded(lmx::c_read& source) {
+    reading<lmx::c_get_as_utf8> r(source);
+    return rest_of(r.in) + r.errors.reports;
+}
+
+TEST(decoding, finds_the_encoding_from_the_first_bytes) {
+    const given stream{decoded};
+    stream.from_every_source(rows("@1" + unrecognised, {"\xEF\xBB<a>", "\xFF\xFE\xE9\x00"s, "\xFF\xFE\x00\x00"s,
+                                                        "\xFE\xFF\x01<", "\xFF<", "\0a"s, "a<"}));
+    stream.from_every_source(rows("<a>@1", {"<a>", "\xEF\xBB\xBF<a>", "\xFF\xFE<\0a\0>\0"s, "\xFE\xFF\0<\0a\0>"s}));
+    stream.from_every_source(rows("@1", {"", "\xEF\xBB\xBF"}));
+    stream.from_every_source({{" \0<\0a\0"s, " <a@1", "a blank in UTF-16 little-endian without mark"},
+                              {"\0\n\0<\0a"s, "<10><a@2", "a line feed in UTF-16 big-endian without mark"},
+                              {" ", " @1", "one blank alone"},
+                              {"<\xC3\xA9>", "<\xC3\xA9>@1", "the second character may have several bytes"},
+                              {"<\xC3", "<@1", "and may be cut off"},
+                              {"\r\n<", "<10><@2", "or be the second half of a line end"},
+                              {"\n\xE2\x80\xA8<", "<10><10><@3", "or be a line separator"}});
+}
+
+TEST(decoding, folds_line_ends_and_ends_at_what_is_no_character) {
+    const given stream{decoded};
+    stream.from_every_source(
+        {{"<\ra\nb\r\nc\n\rd\r\n\n", "<<10>a<10>b<10>c<10><10>d<10><10>@8", "CR, LF and CR LF are one line end each"},
+         {"<\xC2\x85\xE2\x80\xA8\xE2\x80\xA9", "<<10><10>\xE2\x80\xA9@3", "U+0085 and U+2028, but not U+2029"},
+         {"<\xF0\x9D\x84\x9E", "<\xF0\x9D\x84\x9E@1", "four bytes"},
+         {"<a\xE1zzb", "<a\xE1zzb@1", "the bytes behind the second one are not looked at, nor that one always"},
+         {"<a\xE1\x82\0b"s, "<a\xE1\x82"s + "b@1", "a NUL cuts its sequence short"}});
+    // A surrogate, a continuation byte alone, an overlong lead, five bytes, too large a number, a sequence cut off.
+    stream.from_every_source(rows("<a@1", {"<a\xED\xA0\x80z", "<a\x80z", "<a\xC0\x80z", "<a\xF8\x88\x80\x80\x80z",
+                                           "<a\xF4\x90\x80\x80z", "<a\xE2\x82"}));
+    reading<lmx::c_get_as_utf8> r("<\x80z"s);
+    for (const int c : {int{'<'}, -1, int{'z'}})
+        EXPECT_EQ(r.in.get(), c) << "what is no UTF-8 reads as the end, right behind the first character too";
+}
+
+TEST(decoding, utf16_joins_surrogates) {
+    const std::vector<row> rows = {
+        {"\xD8\x34\xDD\x1E"s, "<\xF0\x9D\x84\x9E@1", "a pair"},
+        {"\xD8\x34\x00\x61"s, "<@1" + unrecognised, "a high one and something else"},
+        {"\xDD\x1E\x00\x61"s, "<\xED\xB4\x9E"s + "a@1", "a low one alone is a character"},
+        {"\xD8\x34\xDD"s, "<@1", "cut off, without a report"},
+        {"\x00"s, "<@1", "half a unit"},
+        {"\x00\x85\x20\x28\x00\x0D\x00\x0A\x00\x61"s, "<<10><10><10>a@4", "line ends of all kinds"}};
+    for (const auto& [units, expected, why] : rows) {
+        std::string swapped = units;
+        for (std::size_t i = 0; i + 1 < units.size(); i += 2)
+            std::swap(swapped[i], swapped[i + 1]);
+        given{decoded}.from_every_source({{"\0<"s + units, expected, why}, {"<\0"s + swapped, expected, why}});
+    }
+}
+
+TEST(decoding, takes_the_declared_encoding_only_where_it_fits) {
+    const std::string mismatch = "@1 {0 15 Mis-match between specfied encoding and byte format}";
+    const std::string unknown = "@1 {0 6 Unknown character encoding specified}";
+    const std::string big = "\0<\0a\x00\xE9\xD8\x00\x00z"s;
+    const std::string little = "<\0a\0\xE9\0\x00\xD8z\0"s;
+    const struct {
+        std::string bytes;
+        const char* name;
+        std::string rest;
+    } rows[] = {{"<a\xC3\xA9", "utf-8", "\xC3\xA9@1"},
+                {"<a\xE9\x85", "ISO-8859-1", "\xC3\xA9<10>@2"},
+                {"<a\x7F\xE9", "us-ascii", "\x7F\xC3\xA9@1"},
+                {"<az", "UTF-16", mismatch},
+                {"<az", "ISO-10646-UCS-2", mismatch},
+                {"<az", "windows-1252", unknown},
+                {"<az", "UTF-8 ", unknown},
+                {big, "UTF-16", "\xC3\xA9@1" + unrecognised},
+                {big, "iso-10646-ucs-2", "\xC3\xA9\xED\xA0\x80z@1"},
+                {little, "ISO-10646-UCS-2", "\xC3\xA9\xED\xA0\x80z@1"},
+                {big, "UTF-8", mismatch},
+                {little, "ISO-8859-1", mismatch}};
+    for (const auto& row : rows) {
+        const driver declare = [&](lmx::c_read& source) {
+            reading<lmx::c_get_as_utf8> r(source);
+            r.in.get();
+            r.in.get();
+            EXPECT_EQ(r.in.set_encoding(row.name),
+                      row.rest.find('{') == std::string::npos || row.rest.find("Unrec") != std::string::npos)
+                << row.name;
+            return rest_of(r.in) + r.errors.reports;
+        };
+        given{declare}.from_every_source({{row.bytes, row.rest, row.name}});
+    }
+}
+
+TEST(decoding, rewind_gives_the_same_bytes_and_lines_again) {
+    const std::string texts[] = {"\xEF\xBB\xBF<\r\n\xC2\x85z", "\0<\0\n\0z"s, "<a" + std::string(700, '\n') + "z",
+                                 "\n\r<z"};
+    for (const std::string& text : texts) {
+        const temporary_file on_disk(text);
+        lmx::c_read_file file(on_disk.path.c_str());
+        const std::string first = decoded(file);
+        file.rewind();
+        reading<lmx::c_get_as_utf8> r(file);
+        for (int part = 0; part < 5; ++part) {
+            for (int i = 0; i < part; ++i)
+                r.in.get();
+            r.in.unget('x');
+            r.in.rewind();
+            EXPECT_EQ(r.in.get_line_num(), 1);
+            EXPECT_EQ(rest_of(r.in), first) << "after " << part;
+            r.in.rewind();
+        }
+    }
+}
+
+TEST(error_object, gets_source_and_line_from_whoever_reads) {
+    callers_source source("<\n\n");
+    recorder errors;
+    {
+        lmx::c_get_as_utf8 getter(source, errors);
+        rest_of(getter);
+        errors.error(lmx::error_error, lmx::err_badly_formed_dtd, "here");
+        EXPECT_EQ(errors.last_line, 3);
+    }
+    errors.error(lmx::error_error, lmx::err_badly_formed_dtd, "nowhere");
+    EXPECT_EQ(errors.last_line, -1) << "nobody reads any more";
 }
 
 } // namespace

@@ -2,7 +2,6 @@
 
 #include "hqf/xml_in/c_read_file.h"
 #include "hqf/xml_in/c_read_string.h"
-#include "hqf/xml_in/c_xml.h"
 
 #include <gtest/gtest.h>
 
@@ -25,37 +24,42 @@ temporary_file::temporary_file(const std::string& bytes)
     std::fclose(file);
 }
 
-void expect_from_every_source(const std::string& bytes, const driver& run, const std::string& expected,
-                              const std::string& why) {
-    lmx::c_read_memory memory(bytes.data(), static_cast<unsigned int>(bytes.size()));
-    EXPECT_EQ(run(memory), expected) << why << " (memory)";
-    lmx::c_read_string string(bytes);
-    EXPECT_EQ(run(string), expected) << why << " (string)";
-    callers_source callers(bytes);
-    EXPECT_EQ(run(callers), expected) << why << " (caller's source)";
-    const temporary_file on_disk(bytes);
-    lmx::c_read_file file(on_disk.path.c_str());
-    EXPECT_EQ(run(file), expected) << why << " (file)";
+std::vector<row> rows(const std::string& expected, const std::vector<std::string>& texts) {
+    std::vector<row> out;
+    for (const std::string& text : texts)
+        out.push_back({text, expected, testing::PrintToString(text)});
+    return out;
 }
 
-void expect_everywhere(const std::string& bytes, const driver& run, const std::string& expected,
-                       const std::string& why) {
-    expect_from_every_source(bytes, run, expected, why);
-    if (bytes.empty() || bytes[0] != '<') return;
-    for (std::size_t edge = 1; edge <= bytes.size() && edge < 512; ++edge) {
-        std::string padded = std::string(512 - edge, ' ') + bytes;
-        lmx::c_read_file open_file(fmemopen(padded.data(), padded.size(), "rb"));
-        ASSERT_EQ(run(open_file), expected) << why << " (edge of a file block at byte " << edge << ")";
+void given::from_every_source(const std::vector<row>& rows) const {
+    for (const auto& [bytes, expected, why] : rows) {
+        lmx::c_read_memory memory(bytes.data(), static_cast<unsigned int>(bytes.size()));
+        EXPECT_EQ(run(memory), expected) << why << " (memory)";
+        lmx::c_read_string string(bytes);
+        EXPECT_EQ(run(string), expected) << why << " (string)";
+        callers_source callers(bytes);
+        EXPECT_EQ(run(callers), expected) << why << " (caller's source)";
+        const temporary_file on_disk(bytes);
+        lmx::c_read_file file(on_disk.path.c_str());
+        EXPECT_EQ(run(file), expected) << why << " (file)";
     }
 }
 
-std::string decoded(lmx::c_read& source) {
-    recorder errors;
-    lmx::c_get_as_utf8 getter(source, errors);
+void given::everywhere(const std::vector<row>& rows) const {
+    from_every_source(rows);
+    for (const auto& [bytes, expected, why] : rows)
+        for (std::size_t edge = 1; bytes[0] == '<' && edge <= bytes.size() && edge < 512; ++edge) {
+            std::string padded = std::string(512 - edge, ' ') + bytes;
+            lmx::c_read_file open_file(fmemopen(padded.data(), padded.size(), "rb"));
+            ASSERT_EQ(run(open_file), expected) << why << " (edge of a file block at byte " << edge << ")";
+        }
+}
+
+std::string rest_of(lmx::c_get_as_utf8& getter) {
     std::string out;
     for (int c = getter.get(); c != -1; c = getter.get())
         out += c < ' ' ? "<" + std::to_string(c) + ">" : std::string(1, static_cast<char>(c));
-    return out + "@" + std::to_string(getter.get_line_num()) + errors.reports;
+    return out + "@" + std::to_string(getter.get_line_num());
 }
 
 namespace {
@@ -88,40 +92,30 @@ bool put_tag(lmx::c_xml& xml, lmx::c_xml_local* scope, std::string* out) {
 } // namespace
 
 std::string tokens(lmx::c_read& source) {
-    recorder errors;
-    lmx::c_xml xml(source, errors, true);
-    lmx::c_xml_local scope;
-    std::string out;
-    while (put_tag(xml, &scope, &out)) {
+    reading<lmx::c_xml> r(source, true);
+    while (put_tag(r.in, &r.scope, &r.value)) {
     }
-    return out + "@" + std::to_string(xml.get_line_num()) + errors.reports;
+    return r.value + "@" + std::to_string(r.in.get_line_num()) + r.errors.reports;
 }
 
 driver value_in(lmx::elmx_whitespace mode) {
     return [mode](lmx::c_read& source) {
-        recorder errors;
-        lmx::c_xml xml(source, errors, true);
-        lmx::c_xml_local scope;
-        std::string out;
-        std::string value;
-        xml.get_element_name(&scope, &value);
-        xml.move_to_start_tag_end(nullptr);
-        if (!xml.get_element_value(&value, mode, true)) return "!" + errors.reports;
-        out += "(" + value + ")";
-        put_tag(xml, &scope, &out);
-        return out + errors.reports;
+        reading<lmx::c_xml> r(source, true);
+        r.in.get_element_name(&r.scope, &r.name);
+        r.in.move_to_start_tag_end(nullptr);
+        if (!r.in.get_element_value(&r.value, mode, true)) return "!" + r.errors.reports;
+        std::string out = "(" + r.value + ")";
+        put_tag(r.in, &r.scope, &out);
+        return out + r.errors.reports;
     };
 }
 
 driver attribute_value_in(lmx::elmx_whitespace mode) {
     return [mode](lmx::c_read& source) {
-        recorder errors;
-        lmx::c_xml xml(source, errors, true);
-        lmx::c_xml_local scope;
-        std::string value;
-        xml.get_element_name(&scope, &value);
-        xml.get_attribute_name(&value, false);
-        return (xml.get_attribute_value(&value, mode) ? "(" + value + ")" : "!") + errors.reports;
+        reading<lmx::c_xml> r(source, true);
+        r.in.get_element_name(&r.scope, &r.name);
+        r.in.get_attribute_name(&r.name, false);
+        return (r.in.get_attribute_value(&r.value, mode) ? "(" + r.value + ")" : "!") + r.errors.reports;
     };
 }
 

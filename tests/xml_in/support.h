@@ -2,11 +2,12 @@
 
 #include "hqf/errors/c_error.h"
 #include "hqf/xml_in/c_read.h"
-#include "hqf/xml_in/elmx_whitespace.h"
+#include "hqf/xml_in/c_xml.h"
 
 #include <cstdio>
 #include <functional>
 #include <string>
+#include <vector>
 
 /// Text in, one string out: the drivers of these tests, and the sources that every case runs over.
 
@@ -15,7 +16,7 @@ namespace xml_in_test {
 /// A source as an application would write one.
 class callers_source : public lmx::c_read {
 public:
-    explicit callers_source(std::string bytes)
+    explicit callers_source(std::string bytes = {})
         : bytes_(std::move(bytes)) {}
     int read() override { return next_ < bytes_.size() ? static_cast<unsigned char>(bytes_[next_++]) : -1; }
     void rewind() override { next_ = 0; }
@@ -44,19 +45,48 @@ public:
     const std::string path;
 };
 
+/// A stream of characters or a tokeniser, with what it needs.
+template<class T>
+struct reading {
+    callers_source own;
+    recorder errors;
+    T in;
+    lmx::c_xml_local scope;
+    std::string name;
+    std::string value;
+
+    template<class... A>
+    explicit reading(lmx::c_read& source, A... more)
+        : in(source, errors, more...) {}
+    template<class... A>
+    explicit reading(const std::string& text, A... more)
+        : own(text)
+        , in(own, errors, more...) {}
+};
+
 using driver = std::function<std::string(lmx::c_read&)>;
 
-/// Runs a driver over the bytes as memory, string, file and caller's source. All must give `expected`.
-void expect_from_every_source(const std::string& bytes, const driver& run, const std::string& expected,
-                              const std::string& why);
+struct row {
+    std::string bytes;
+    std::string expected;
+    std::string why;
+};
 
-/// The same, and from an open file with the edge of a block at every byte, for a driver that blanks in front don't
-/// disturb.
-void expect_everywhere(const std::string& bytes, const driver& run, const std::string& expected,
-                       const std::string& why);
+/// The same for many texts that give the same.
+std::vector<row> rows(const std::string& expected, const std::vector<std::string>& texts);
 
-/// Every byte that a getter gives, control characters as <decimal>, then "@line" and the reports.
-std::string decoded(lmx::c_read& source);
+/// What the driver must give for the bytes of each row.
+struct given {
+    driver run;
+    /// As memory, string, file and caller's source.
+    void from_every_source(const std::vector<row>& rows) const;
+    /// The same, and from an open file with the edge of a block at every byte of what starts with '<', for a driver
+    /// that blanks in front don't disturb.
+    void everywhere(const std::vector<row>& rows) const;
+};
+
+/// Every byte that a getter gives, control characters as <decimal>, then "@line".
+std::string rest_of(lmx::c_get_as_utf8& getter);
 
 /// All tags: <name attribute='value'>, </name>, [text], and "." at the end of input; "!" and the end where something
 /// fails. Then "@line" and the reports.

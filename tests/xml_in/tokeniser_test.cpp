@@ -1,8 +1,5 @@
 #include "support.h"
 
-#include "hqf/xml_in/c_read_string.h"
-#include "hqf/xml_in/c_xml.h"
-
 #include <gtest/gtest.h>
 
 namespace {
@@ -11,180 +8,260 @@ using namespace xml_in_test;
 using namespace std::string_literals;
 
 const std::string not_well_formed = " {1 23 XML not Well-Formed}";
-const std::string tag_not_well_formed = " {1 23 XML not well-formed}";
-
-struct row {
-    std::string text;
-    std::string tokens;
-    const char* why;
-};
-
-void expect_tokens(std::initializer_list<row> rows) {
-    for (const row& r : rows)
-        expect_everywhere(r.text, tokens, r.tokens, r.why);
-}
 
 TEST(tokeniser, yields_tags_and_text) {
-    expect_tokens({
-        {"<a>\n <b/> t\tx</a>", "<a><b/>[t\tx]</a>.@2", "white space in front of text is passed over"},
-        {"<a><b>x</c>y", "<a><b>[x]</c>[y].@1", "tags need not match here, and the end may come anywhere"},
-        {"<a></a \n>", "<a></a>.@2", "white space in an end tag"},
-        {"<_:-.9\xC3\xA9/>", "<_:-.9\xC3\xA9/>.@1", "all that a name may hold"},
-        {"<a>x&lt;&#65;</a>", "<a>[x<A]</a>.@1", "references in text"},
-        {"<a>&amp;x</a>", "<a>[&x]</a>.@1", "and at its start"},
-        {"<a>x&nope;", "<a>!@1", "an unknown one fails without a report"},
-        {"<a>&nope;", "<a>!@1", "also at the start"},
-        {"<a><![CDATA[ <b> ]]></a>", "<a>[ <b> ]</a>.@1", "a CDATA section is text by itself"},
-        {"<a><![CDATA[a]]]></a>", "<a>[a]]</a>.@1", "a bracket before its end"},
-        {"<a><![CDATA[]>]]]] >]]></a>", "<a>[]>]]]] >]</a>.@1", "brackets that end nothing"},
-        {"<a><![CDATA[x]]", "<a>[x].@1", "ended by the end of input"},
-        {"<a><![CDATA[x]]]]", "<a>[x]]].@1", "all but the last two brackets are text"},
-        {"", ".@1", "nothing at all"},
-    });
+    given{tokens}.everywhere(
+        {{"<a>\n <b/> t\tx</a>", "<a><b/>[t\tx]</a>.@2", "white space in front of text is passed over"},
+         {"<a><b>x</c \n>y", "<a><b>[x]</c>[y].@2", "tags need not match here, and the end may come anywhere"},
+         {"<_:-.9\xC3\xA9/>", "<_:-.9\xC3\xA9/>.@1", "all that a name may hold"},
+         {"<a>x&lt;<b>&amp;x", "<a>[x<]<b>[&x].@1", "references in text and at its start"},
+         {"<a><![CDATA[ <b> ]]></a>", "<a>[ <b> ]</a>.@1", "a CDATA section is text by itself"},
+         {"<a><![CDATA[a]]]></a><![CDATA[]>]]]] >]]>", "<a>[a]]</a>[]>]]]] >].@1", "brackets that end nothing"},
+         {"<a><![CDATA[x]]]]", "<a>[x]]].@1", "ended by the end of input: all but the last two brackets are text"},
+         {"", ".@1", "nothing at all"}});
 }
 
 TEST(tokeniser, refuses_what_is_no_tag) {
-    expect_tokens({
-        {"<a", "!@1" + not_well_formed, "the end within a name"},
-        {"<a>< b>", "<a>!@1" + not_well_formed, "a blank behind <"},
-        {"<a><1b>", "<a>!@1" + not_well_formed, "a digit behind <"},
-        {"<a><1 q='>'/x>", "<a>!@1" + not_well_formed + " {1 12 Illegal character(s) after / at end of tag - x}",
-         "and its tag is read over, quotes minded"},
-        {"<a></>", "<a>!@1", "an end tag without name is not even reported"},
-        {"<a></a b>", "<a>!@1" + not_well_formed, "something else in an end tag"},
-        {"<a></a", "<a>!@1" + not_well_formed, "the end within an end tag"},
-        {"<a><![CDAT[x]]>", "<a>!@1" + not_well_formed + not_well_formed, "no CDATA"},
-        {"<a><!x>", "<a>!@1", "no markup declaration"},
-        {"<a><!-x>", "<a>!@1", "no comment"},
-        {"<!DOCTYP x>", "!@1", "no document type"},
-    });
+    given{tokens}.everywhere(rows("<a>!@1" + not_well_formed, {"<a>< b>", "<a><1>", "<a></a b>", "<a></a"}));
+    given{tokens}.everywhere(rows("<a>!@1", {"<a></>", "<a><!x>", "<a><!-x>", "<a>&nope;", "<a>x&nope;"}));
+    given{tokens}.everywhere(
+        {{"<a", "!@1" + not_well_formed, "the end within a name"},
+         {"<a><1 q='>'/x>", "<a>!@1" + not_well_formed + " {1 12 Illegal character(s) after / at end of tag - x}",
+          "what is no tag is read over, quotes minded"},
+         {"<a><![CDAT[x]]>", "<a>!@1" + not_well_formed + not_well_formed, "no CDATA"}});
 }
 
 TEST(tokeniser, passes_comments_and_instructions_over) {
-    expect_tokens({
-        {"<!-- c --><a><!----></a>", "<a></a>.@1", "before and inside the root"},
-        {"<!-- a -- b > -> --><a/>", "<a/>.@1", "hyphens in the middle"},
-        {"<!-- a --->\n<a/>", "<a/>.@2 {2 8 End of comment not Well-Formed}", "one hyphen too many is a warning"},
-        {"<!--->--><a/>", "<a/>.@1", "one hyphen too few goes on"},
-        {"<!-- a", "!@1", "not ended"},
-        {"<?x?><?y a > b ?\?><a/>", "<a/>.@1", "instructions end at their own ?>"},
-        {"<?\?><a/>", "<a/>.@1", "even one without target"},
-        {"<?xm?><a/>", "<a/>.@1", "or with half of another's"},
-        {"<?x >", "!@1", "not ended"},
-    });
+    given{tokens}.everywhere(
+        {{"<!-- c --><a><!----></a>", "<a></a>.@1", "before and inside the root"},
+         {"<!-- a -- b > -> --><!--->--><a/>", "<a/>.@1", "hyphens in the middle, and one too few to end"},
+         {"<!-- a --->\n<a/>", "<a/>.@2 {2 8 End of comment not Well-Formed}", "one hyphen too many is a warning"},
+         {"<?x?><?y a > b ?\?><?\?><?xm?><a/>", "<a/>.@1", "instructions end at their own ?>, whatever the target"}});
+    given{tokens}.everywhere(rows("!@1", {"<!-- a", "<!-- a --", "<?x >", "<!DOCTYP x>"}));
 }
 
 TEST(tokeniser, reads_the_xml_declaration) {
     const std::string no_version = " {1 13 Version not present in XML Decl}";
-    expect_tokens({
-        {"<?xml version=\"1.0\"?><a/>", "<a/>.@1", "the usual one"},
-        {"<?xml\tversion = '1.1' encoding = 'utf-8' standalone = 'yes' ?><a/>", "<a/>.@1", "with all its parts"},
-        {"<?xmlversion='1.0'standalone='maybe'?><a/>", "<a/>.@1", "blanks may be missing"},
-        {"<!-- c --><?p?><?xml version='1.0'?><a/>", "<a/>.@1", "comments don't leave the prolog"},
-        {"<?xml-stylesheet href='x'?><a/>", "!@1" + no_version, "a target that starts with xml"},
-        {"<?xml?>", "!@1" + no_version, "no version"},
-        {"<?xml version=1.0?>", "!@1" + no_version, "no quotes"},
-        {"<?xml version='2.0'?>", "!@1 {1 14 XML version 2.0 not understood}", "another version"},
-        {"<?xml version='1.0' standalone='no'?>", "!@1 {1 13 XML Document is not standalone}", "not standalone"},
-        {"<?xml version='1.0' standalone='yes' encoding='UTF-8'?>", "!@1", "the wrong order"},
-        {"<?xml version='1.0' encoding?>", "!@1", "an encoding without name"},
-        {"<?xml version='1.0' encoding='UTF-16'?><a/>",
-         "!@1 {0 15 Mis-match between specfied encoding and byte format}", "the wrong encoding"},
-        {"<?xml version='1.0' encoding='ISO-8859-1'?><a>\xE9</a>", "<a>[\xC3\xA9]</a>.@1", "the right one"},
-        {"<?xml version='1.0' ? ><a/>", "!@1", "a blank before >"},
-        {"<a><?xml version='1.0'?>", "<a>!@1 {0 13 XML declaration not at start of document}", "too late"},
-        {"x<?xml version='1.0'?>", ".@1 {0 6 Unrecognised character encoding}", "not at all"},
-        {" &amp;<?xml version='1.0'?>", "[&]!@1 {0 13 XML declaration not at start of document}", "behind text"},
-    });
+    given{tokens}.everywhere(
+        {{"<?xml\tversion = '1.1' encoding = 'utf-8' standalone = 'yes' ?><a/>", "<a/>.@1", "with all its parts"},
+         {"<?xmlversion=\"1.0\"standalone='maybe'?><a/>", "<a/>.@1", "blanks may be missing"},
+         {"<!-- c --><?p?><?xml version='1.0'?><a/>", "<a/>.@1", "comments don't leave the prolog"},
+         {"<?xml version='2.0'?>", "!@1 {1 14 XML version 2.0 not understood}", "another version"},
+         {"<?xml version='1.0' standalone='no'?>", "!@1 {1 13 XML Document is not standalone}", "not standalone"},
+         {"<?xml version='1.0' encoding='UTF-16'?><a/>",
+          "!@1 {0 15 Mis-match between specfied encoding and byte format}", "the wrong encoding"},
+         {"<?xml version='1.0' encoding='ISO-8859-1'?><a>\xE9</a>", "<a>[\xC3\xA9]</a>.@1", "the right one"},
+         {"<a><?xml version='1.0'?>", "<a>!@1 {0 13 XML declaration not at start of document}", "too late"},
+         {" &amp;<?xml version='1.0'?>", "[&]!@1 {0 13 XML declaration not at start of document}", "behind text"}});
+    given{tokens}.everywhere(rows("!@1" + no_version, {"<?xml-stylesheet href='x'?><a/>", "<?xml version=1.0?>"}));
+    given{tokens}.everywhere(rows("!@1", {"<?xml version='1.0' standalone='yes' encoding='UTF-8'?>",
+                                          "<?xml version='1.0' encoding?>", "<?xml version='1.0' ? ><a/>"}));
 }
 
 TEST(tokeniser, reads_attributes) {
     const std::string no_equals = " {0 23 Schema is not Well Formed (expected '=', got '";
     const std::string no_quote = " {0 23 Schema is not Well Formed (expected '\"' or ''', got ";
-    expect_tokens({
-        {"<a b=\"1\"c='2\"'/>", "<a b='1' c='2\"'/>.@1", "no white space between, either quote"},
-        {"<a b = '1' />", "<a b='1'/>.@1", "white space around ="},
-        {"<a\nb\n=\n'x\ny'\n>", "<a b='x\ny'>.@6", "line ends everywhere"},
-        {"<a b='<>/&#65;&lt;'/>", "<a b='<>/A<'/>.@1", "markup in a value, and references"},
-        {"<a b='&nope;x' c='2'/>", "<a b=! c='2'/>.@1", "a reference that fails leaves the next attribute alone"},
-        {"<a b='1' b='2'/>", "<a b='1' b='2'/>.@1", "repeated ones are the caller's affair"},
-        {"<a xmlnsx='1' xmln='2' xmlns.='3'/>", "<a xmlnsx='1' xmln='2' xmlns.='3'/>.@1", "names like xmlns"},
-        {"<a xmlns='u' b='1' xmlns:p='v'/>", "<a b='1'/>.@1", "declarations are kept apart"},
-        {"<a b>", "!@1" + no_equals + ">')}", "no ="},
-        {"<a b", "!@1 {0 34 Unexpected end of file}", "the end in place of ="},
-        {"<a b=c>", "!@1" + no_quote + "c)}", "no quote"},
-        {"<a b='1 >", "!@1" + no_quote + ")}", "a quote without end"},
-        {"<a b='1'", "!@1", "the end in a tag"},
-        {"<a b='1' / >", "<a b='1'/>.@1", "white space before the end"},
-        {"<a b='1' /x>", "<a b='1'!@1" + tag_not_well_formed, "no > behind /"},
-        {"<a b='1' ?>", "<a b='1'!@1" + tag_not_well_formed, "the end of another kind of tag"},
-        {"<a b='x\0y'/>"s, "<a b='x' y=''/>.@1", "a NUL splits a value, and nothing worse"},
-    });
-}
-
-TEST(tokeniser, reads_the_document_type_once_and_first) {
-    expect_tokens({
-        {"<!DOCTYPE a><a/>", "<a/>.@1", "no subset"},
-        {"<!DOCTYPE a SYSTEM \"x\"><a/>", "<a/>.@1", "an external one"},
-        {"<!DOCTYPE a><!DOCTYPE a>", "!@1 {1 9 Document Type Declaration already read}", "twice"},
-        {"<a><!DOCTYPE a>", "<a>!@1 {1 9 Document Type Declaration not at start of document}", "late"},
-        {"<!DOCTYPE a", "!@1", "not ended"},
-    });
+    given{tokens}.everywhere(
+        {{"<a b=\"1\"c='2\"'\nd\n=\n'x\ny'\n e = '5' / >", "<a b='1' c='2\"' d='x\ny' e='5'/>.@6",
+          "white space and quotes"},
+         {"<a b='<>/&#65;&lt;' c='&nope;x' d='2'/>", "<a b='<>/A<' c=! d='2'/>.@1",
+          "a reference that fails spoils one"},
+         {"<a xmlns='u' b='1' xmlns:p='v' b='2' xmlnsx='3' xmln='4' xmlns.='5'/>",
+          "<a b='1' b='2' xmlnsx='3' xmln='4' xmlns.='5'/>.@1", "only declarations are kept apart"},
+         {"<a b>", "!@1" + no_equals + ">')}", "no ="},
+         {"<a b", "!@1 {0 34 Unexpected end of file}", "the end in place of ="},
+         {"<a b=c>", "!@1" + no_quote + "c)}", "no quote"},
+         {"<a b='1 >", "!@1" + no_quote + ")}", "a quote without end"},
+         {"<a b='1'", "!@1", "the end in a tag"},
+         {"<a b='x\0y'/>"s, "<a b='x' y=''/>.@1", "a NUL splits a value, and nothing worse"}});
+    given{tokens}.everywhere(rows("<a b='1'!@1 {1 23 XML not well-formed}", {"<a b='1' /x>", "<a b='1' ?>"}));
 }
 
 TEST(tokeniser, finds_attributes_out_of_order) {
-    const std::string text = "<a x='1' p:x='2' p:type='q:T' p:z='&nope;' xmlns:p='http://www.w3.org/2001/"
-                             "XMLSchema-instance' xmlns:q='u'/>";
-    lmx::c_read_string source(text);
-    recorder errors;
-    lmx::c_xml xml(source, errors, true);
-    lmx::c_xml_local scope;
-    std::string name;
-    std::string value;
-    xml.get_element_name(&scope, &name);
-    EXPECT_TRUE(xml.get_named_attribute(&scope, 5, "x", &value));
-    EXPECT_EQ(value, "2");
-    EXPECT_TRUE(xml.get_named_attribute(&scope, 0, "x", &value)) << "no default namespace";
-    EXPECT_EQ(value, "1");
-    EXPECT_FALSE(xml.get_named_attribute(&scope, 5, "y", &value));
-    EXPECT_FALSE(xml.get_named_attribute(&scope, 5, "z", &value)) << "its value fails";
+    reading<lmx::c_xml> r("<a x='1' p:x='2' p:type='q:T' p:z='&nope;' xmlns:q='u' "
+                          "xmlns:p='http://www.w3.org/2001/XMLSchema-instance'/>"s,
+                          true);
+    r.in.get_element_name(&r.scope, &r.name);
+    const auto named = [&](int ns_id, const char* name) {
+        return r.in.get_named_attribute(&r.scope, ns_id, name, &r.value) ? r.value : "!";
+    };
+    EXPECT_EQ(named(5, "x") + named(0, "x"), "21") << "no default namespace";
+    EXPECT_EQ(named(5, "y") + named(5, "z"), "!!") << "none, or a value that fails";
     int ns_id = 0;
-    EXPECT_TRUE(xml.get_xsi_type(&scope, &ns_id, &value));
-    EXPECT_EQ(ns_id, 1000);
-    EXPECT_EQ(value, "T");
-    EXPECT_EQ(xml.get_attribute_name(&name, false), lmx::EXE_NAME);
-    EXPECT_EQ(name, "x") << "the attribute loop still starts at the first one";
-}
-
-TEST(tokeniser, without_a_scope_declarations_are_attributes) {
-    const std::string text = "<a xmlns='u'/>";
-    lmx::c_read_string source(text);
-    recorder errors;
-    lmx::c_xml xml(source, errors, true);
-    std::string name;
-    xml.get_element_name(nullptr, &name);
-    EXPECT_EQ(xml.get_attribute_name(&name, false), lmx::EXE_NAME);
-    EXPECT_EQ(name, "xmlns");
+    EXPECT_TRUE(r.in.get_xsi_type(&r.scope, &ns_id, &r.value));
+    EXPECT_EQ(r.value + std::to_string(ns_id), "T1000");
+    EXPECT_EQ(r.in.get_attribute_name(&r.name, false), lmx::EXE_NAME);
+    EXPECT_EQ(r.name, "x") << "the attribute loop still starts at the first one";
+    reading<lmx::c_xml> without_scope("<a xmlns='u'/>"s, true);
+    without_scope.in.get_element_name(nullptr, &r.name);
+    EXPECT_EQ(without_scope.in.get_attribute_name(&r.name, false), lmx::EXE_NAME);
+    EXPECT_EQ(r.name, "xmlns") << "without a scope declarations are attributes";
 }
 
 TEST(tokeniser, rewinds_to_the_first_byte) {
-    const std::string text = "<?xml version='1.0'?><!DOCTYPE a [<!ENTITY e 'v'>]><a xmlns:p='u'>&e;</a>";
-    lmx::c_read_string source(text);
-    recorder errors;
-    lmx::c_xml xml(source, errors, true);
+    reading<lmx::c_xml> r("<?xml version='1.0'?><!DOCTYPE a [<!ENTITY e 'v'>]><a xmlns:p='u'>&e;</a>"s, true);
     for (int round = 0; round < 2; ++round) {
-        lmx::c_xml_local scope;
-        std::string name;
-        EXPECT_EQ(xml.get_element_name(&scope, &name), lmx::EXE_NAME) << "declaration and document type again";
-        EXPECT_EQ(scope.find_namespace_id("p"), 1000);
-        EXPECT_EQ(xml.find_enumerated_namespace("u"), 1000);
-        xml.move_to_start_tag_end(nullptr);
-        EXPECT_EQ(xml.get_element_name(&scope, &name), lmx::EXE_CHARS);
-        EXPECT_EQ(name, "v");
-        xml.rewind();
-        EXPECT_EQ(xml.find_enumerated_namespace("u"), 0);
+        r.scope.clear();
+        EXPECT_EQ(r.in.get_element_name(&r.scope, &r.name), lmx::EXE_NAME) << "declaration and document type again";
+        EXPECT_EQ(r.scope.find_namespace_id("p"), 1000);
+        EXPECT_EQ(r.in.find_enumerated_namespace("u"), 1000);
+        r.in.move_to_start_tag_end(nullptr);
+        EXPECT_EQ(r.in.get_element_name(&r.scope, &r.name), lmx::EXE_CHARS);
+        EXPECT_EQ(r.name, "v");
+        r.in.rewind();
+        EXPECT_EQ(r.in.find_enumerated_namespace("u"), 0);
     }
-    EXPECT_EQ(errors.reports, "");
+    EXPECT_EQ(r.errors.reports, "");
+}
+
+TEST(value, keeps_replaces_or_collapses_white_space) {
+    const struct {
+        std::string raw;
+        std::string values[3];
+        const char* why;
+    } rows[] = {
+        {"  a  b  ", {"  a  b  ", "  a  b  ", "a b"}, "blanks"},
+        {"\ta\r\n\vb\f", {"\ta\n\vb\f", " a  b ", "a b"}, "each character from tab to carriage return"},
+        {" \t ", {" \t ", "   ", ""}, "nothing else"},
+        {"a &lt; b", {"a < b", "a < b", "a < b"}, "a predefined reference keeps the blanks around it"},
+        {" &lt;", {" <", " <", "<"}, "but no blank goes in front of everything"},
+        {"a&#9;&#32;b&#10;", {"a\t b\n", "a  b ", "a b"}, "white space from references"},
+        {"a&#x85;&#x2028;b", {"a\n\nb", "a  b", "a b"}, "line ends from references"},
+        {"a &#233; b", {"a \xC3\xA9 b", "a \xC3\xA9 b", "a \xC3\xA9 b"}, "characters above ASCII"},
+    };
+    for (const auto& row : rows)
+        for (const auto mode : {lmx::preserve, lmx::replace, lmx::collapse}) {
+            const std::string value = "(" + row.values[mode] + ")";
+            const std::string why = row.why + ", mode "s + std::to_string(mode);
+            given{value_in(mode)}.everywhere({{"<a>" + row.raw + "</a>", value + "</a>", why}});
+            given{attribute_value_in(mode)}.everywhere({{"<a b=\"" + row.raw + "\"/>", value, why}});
+        }
+}
+
+TEST(value, leaves_white_space_from_references_alone_where_told_so) {
+    const std::string values[] = {" \n   x\n", " \n   x\n", "\n x\n"};
+    for (const auto mode : {lmx::preserve, lmx::replace, lmx::collapse}) {
+        reading<lmx::c_xml> r("<a b=' &#10; &#32; x&#x85;'/>"s, false);
+        r.in.get_element_name(nullptr, &r.name);
+        r.in.get_attribute_name(&r.name, false);
+        r.in.get_attribute_value(&r.value, mode);
+        EXPECT_EQ(r.value, values[mode]) << "mode " << mode;
+    }
+}
+
+TEST(value, goes_on_behind_markup_that_vanishes) {
+    given{value_in(lmx::collapse)}.everywhere(
+        {{"<a>x<!--c-->y<?p ?>z<!-- > --></a>", "(xyz)</a>", "comments and instructions"},
+         {"<a> x <![CDATA[ & ]]> y</a>", "(x  &  y)</a>", "CDATA keeps its own blanks, and those around it count"},
+         {"<a><![CDATA[a]]></a>", "(a)</a>", "CDATA alone"},
+         {"<a>x<b c='1'/>", "(x)<b c='1'/>", "stops before a child, which comes back whole"},
+         {"<a></b>", "()</b>", "or before any end tag"},
+         {"<a>x<", "(x)! {1 23 XML not Well-Formed}", "a < at the very end"},
+         {"<a>x&nope;", "!", "an unknown reference fails without a report"},
+         {"<a>x<![CDATE[", "! {1 23 XML not Well-Formed} {1 23 XML not well-formed}", "half a CDATA section"}});
+    given{value_in(lmx::collapse)}.everywhere(rows("! {1 34 Premature end of file encountered}", {"<a>x", "<a>x<!--"}));
+    given{value_in(lmx::collapse)}.everywhere(rows("! {1 23 XML not well-formed}", {"<a>x<!D", "<a>x<!-y"}));
+}
+
+TEST(value, owes_no_blank_to_what_follows) {
+    reading<lmx::c_xml> r("<a> x <b xmlns='u&amp;v'/>yz"s, true);
+    r.in.get_element_name(&r.scope, &r.name);
+    r.in.move_to_start_tag_end(nullptr);
+    r.in.get_element_value(&r.value, lmx::collapse, true);
+    r.in.get_element_name(&r.scope, &r.name);
+    EXPECT_STREQ(r.in.find_namespace_from_id(1000), "u&v") << "a URI";
+    r.in.move_to_start_tag_end(nullptr);
+    EXPECT_EQ(r.in.get_element_name(&r.scope, &r.value), lmx::EXE_CHARS);
+    EXPECT_EQ(r.value, "yz") << "text";
+}
+
+// What an operation on the tokeniser makes of the first element, then what comes next.
+given element(bool (*operate)(lmx::c_xml&, const std::string& name, std::string& out)) {
+    return {[operate](lmx::c_read& source) {
+        reading<lmx::c_xml> r(source, true);
+        std::string out = "done";
+        r.in.get_element_name(&r.scope, &r.name);
+        if (!operate(r.in, r.name, out)) out = "failed";
+        const int event = r.in.get_element_name(&r.scope, &r.name);
+        return out + " then " + std::to_string(event) + r.name + r.errors.reports;
+    }};
+}
+
+TEST(element, end_tag_must_be_the_named_one) {
+    const given end = element([](auto& xml, auto& name, auto&) {
+        xml.move_to_start_tag_end(nullptr);
+        return xml.is_element_end_tag(name);
+    });
+    end.everywhere({{"<a> \n</a\t><n/>", "done then 7n", "white space before and in it"},
+                    {"<a></a b><n/>", "failed then 5>", "something else in it"},
+                    {"<a></ab><n/>", "failed then 5>", "a longer name"},
+                    {"<ab></a><n/>", "failed then 7n", "a shorter name"},
+                    {"<a>x</a>", "failed then 6a", "text before it"}});
+}
+
+TEST(element, start_tag_end_minds_quotes) {
+    const given move = element([](auto& xml, auto&, auto& out) {
+        bool empty = false;
+        out = xml.skip_start_tag(&empty) ? "found" : "not found";
+        out += empty ? ", empty" : "";
+        return true;
+    });
+    move.everywhere({{"<a ><n/>", "found then 7n", "a plain tag"},
+                     {"<a ,'/>\"'>\"><n/>", "found then 5\">", "what stands in quotes ends nothing"},
+                     {"<a / \n><n/>", "found, empty then 7n", "white space behind /"},
+                     {"<a /xy><n/>", "not found, empty then 7n {1 12 Illegal character(s) after / at end of tag - x}",
+                      "one report for all that stands behind /"},
+                     {"<a ,", "not found then 0", "the end before /"},
+                     {"<a /", "found, empty then 0", "the end behind / counts as >"}});
+}
+
+TEST(element, skipping_checks_nested_tags) {
+    const given skip = element([](auto& xml, auto& name, auto&) { return xml.skip_rest_of_element(name); });
+    skip.everywhere(
+        {{"<a/><n/>", "done then 7n", "an empty element"},
+         {"<a>x<b>&lt;<c/></b><!--</a>--><![CDATA[</a>]]></a ><n/>", "done then 7n", "a full one"},
+         {"<a><b><c><d></e></c></b></a>", "failed then 6c {1 23 Element start tag (d) and end tag (e) do not match}",
+          "the report names the inner pair"},
+         {"<a><b>", "failed then 0", "the end of input"},
+         {"<a>&nope;</a>", "failed then 6a", "a reference that fails"}});
+    const given skip_empty = element([](auto& xml, auto& name, auto&) { return xml.skip_rest_of_empty_element(name); });
+    skip_empty.everywhere(rows("done then 7n", {"<a/><n/>", "<a> </a><n/>"}));
+    skip_empty.everywhere(rows("failed then 5/>", {"<a><b/></a>"}));
+}
+
+TEST(element, is_captured_as_raw_text) {
+    const given capture =
+        element([](auto& xml, auto& name, auto& out) { return xml.get_any_element(name, &out, lmx::preserve, true); });
+    capture.everywhere(
+        {{"<p r=\"&amp;\" xmlns:q='u'>text</p><n/>", "<p xmlns:q='u' r=\"&amp;\">text</p> then 7n",
+          "declarations first, references as they are"},
+         {"<p r='1'/><n/>", "<p r='1'/> then 7n", "an empty element"},
+         {"<p r='1'><b  x = '/>'  /> \n <c/> t \n<d>u&e;</d></p ><n/>",
+          "<p r='1'><b  x = '/>'  /><c/> t \n<d>u&e;</d></p> then 7n",
+          "white space goes between tags and stays in text"},
+         {"<p>a<!--c-->b<?i?>c<!x d</p>", "<p>abc d</p> then 0", "comments, instructions and other markup go"},
+         {"<p>x <![CDATA[ </p> ]]]> <1>x</1></p>", "<p>x <![CDATA[ </p> ]]]><1>x</1></p> then 0",
+          "CDATA stays, names are not judged"},
+         {"<p></p q>", "failed then 5>", "nothing else in an end tag"},
+         {"<p>< b></p>", "failed then 5b>", "no blank behind <"},
+         {"<p>x", "failed then 0", "the end of input"}});
+    capture.everywhere(rows("failed then 6p", {"<p><b / x></b></p>", "<p><b></c></p>"}));
+    const given collapsed =
+        element([](auto& xml, auto& name, auto& out) { return xml.get_any_element(name, &out, lmx::collapse, true); });
+    collapsed.everywhere({{"<p>  a  b <c/> d </p>", "<p>a b<c/>d</p> then 0", "each text collapsed by itself"}});
+}
+
+TEST(element, mixed_content_is_captured_up_to_an_end_tag) {
+    const given nested = element([](auto& xml, auto&, auto& out) {
+        std::string end;
+        xml.move_to_start_tag_end(nullptr);
+        const bool is_found = xml.get_nested_element_value(&out, &end, lmx::preserve, true);
+        out += "|" + end;
+        return is_found;
+    });
+    nested.everywhere({{"<a>x<b>y</b>z</a><n/>", "x<b>y</b>z|a then 7n", "text and children"},
+                       {"<a q='1'><b r='2'/></c>", "<b r='2'/>|c then 0", "any end tag; no attribute from before"},
+                       {"<a>x", "failed then 0", "the end of input"}});
 }
 
 } // namespace

@@ -9,7 +9,6 @@
 #include <zlib.h>
 
 #include <algorithm>
-#include <cstdlib>
 #include <filesystem>
 #include <fstream>
 #include <iterator>
@@ -126,8 +125,8 @@ inline archive build(const std::vector<entry>& entries, const std::string& comme
     return made;
 }
 
-/// Causes of our own beside those of `CZipException`: the two ways in which a load ends without an exception.
-enum : int { loaded = 0, no_entry = -1, refused = -2, other_exception = -3 };
+/// Beside the causes of `CZipException`: how a load ends without one.
+enum : int { loaded = 0, no_entry = -1, refused = -2 };
 
 struct outcome {
     int cause;
@@ -159,8 +158,6 @@ inline outcome load(const std::filesystem::path& path, unsigned int piece = 0xFF
         zip.Close(CZipArchive::closeAfterException);
         zip.Close(CZipArchive::closeAfterException);
         return {e.GetCause(), ""};
-    } catch (...) {
-        return {other_exception, ""};
     }
 }
 

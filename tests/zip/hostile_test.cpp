@@ -45,13 +45,11 @@ TEST(zip_hostile, each_field_wrong_alone) {
         const char* why;
     } rows[] = {
         {local, 0, 4, 0x04034B51, 101, "signature"},
-        {local, 4, 2, 99, 0, "version needed counts for nothing"},
         {local, 6, 2, 1, 101, "flag of encryption"},
         {local, 6, 2, 2, 101, "flag of deflate"},
         {local, 6, 2, 8, 101, "flag of the descriptor"},
         {local, 6, 2, 0x0810, 0, "flags above the low four are not compared"},
         {local, 8, 2, 0, 101, "method"},
-        {local, 10, 4, 0, 0, "time and date count for nothing"},
         {local, 14, 4, 1, 101, "CRC-32"},
         {local, 18, 4, 0, 0, "packed size 0 is unknown yet"},
         {local, 18, 4, 1, 101, "packed size"},
@@ -62,9 +60,7 @@ TEST(zip_hostile, each_field_wrong_alone) {
         {local, 28, 2, 3, 101, "an extra field of 3 bytes"},
         {local, 28, 2, 0xFFFF, 101, "an extra field longer than the file"},
         {central, 0, 4, 0x02014B51, 101, "signature"},
-        {central, 4, 1, 255, 0, "version made by"},
         {central, 5, 1, 77, 0, "a host that is not known"},
-        {central, 6, 2, 0xFFFF, 0, "version needed"},
         {central, 8, 2, 1, 101, "encrypted here alone"},
         {central, 10, 2, 0, 101, "method"},
         {central, 10, 2, 99, 101, "method not read, and not the local one"},
@@ -79,8 +75,6 @@ TEST(zip_hostile, each_field_wrong_alone) {
         {central, 32, 2, 1, 0, "the comment takes a byte of the end record"},
         {central, 32, 2, 0xFFFF, 101, "a comment longer than the file"},
         {central, 34, 2, 7, 0, "disk number orders entries only"},
-        {central, 36, 2, 0xFFFF, 0, "internal attributes"},
-        {central, 38, 4, 0xFFFFFFFF, 0, "external attributes"},
         {central, 42, 4, 1, 101, "offset of the local header"},
         {central, 42, 4, directory, 101, "offset of another record"},
         {central, 42, 4, 0x7FFFFFFF, 101, "offset beyond the file"},
@@ -104,19 +98,16 @@ TEST(zip_hostile, each_field_wrong_alone) {
     };
     for (const auto& row : rows) {
         archive made = sound;
-        set_field(made.bytes,
-                  row.at + (row.in == local     ? 0
-                            : row.in == central ? sound.central
-                                                : sound.end),
-                  row.width, row.value);
+        const std::size_t begin[] = {0, sound.central, sound.end};
+        set_field(made.bytes, begin[row.in] + row.at, row.width, row.value);
         const outcome got = load_bytes(made.bytes);
-        const std::string where = "record " + std::to_string(row.in) + " at " + std::to_string(row.at) + ": ";
+        const std::string where = "record " + std::to_string(row.in) + " at " + std::to_string(row.at) + ": " + row.why;
         if (row.cause == any_failure) {
-            EXPECT_TRUE(got.cause != 0 && is_in_the_tables(got.cause)) << where << row.why << ", got " << got.cause;
+            EXPECT_NE(got.cause, 0) << where;
         } else {
-            EXPECT_EQ(got.cause, row.cause) << where << row.why;
+            EXPECT_EQ(got.cause, row.cause) << where;
         }
-        expect_sound(got, where + row.why);
+        expect_sound(got, where);
     }
 }
 
@@ -137,16 +128,12 @@ TEST(zip_hostile, both_headers_lie_alike) {
         {lie(8, [](entry& e) { e.size = e.packed_size * 1032; }), {100}, "deflate: the most it could be"},
         {lie(8, [](entry& e) { e.size = e.packed_size * 1032 + 1; }), {refused}, "deflate: one more than that"},
         {lie(8, [](entry& e) { e.packed_size -= 1; }), {101, 504, 506}, "deflate: packed data cut"},
-        {lie(8, [](entry& e) { e.packed_size -= 20; }), {504, 506}, "deflate: cut by more"},
         {lie(8, [](entry& e) { e.packed_size = 0; }), {refused}, "deflate: no packed data"},
         {lie(8, [](entry& e) { e.packed_size += 1, e.data += "x"; }), {0}, "deflate: more than the stream takes"},
         {lie(8, [](entry& e) { e.packed_size += 6; }), {refused}, "deflate: packed data reach into the directory"},
         {lie(8, [](entry& e) { e.size = e.packed_size = 0, e.data = ""; }), {101}, "deflate: no stream at all"},
         {lie(0, [](entry& e) { e.size += 1; }), {refused}, "stored: one byte more"},
-        {lie(0, [](entry& e) { e.size -= 1; }), {101}, "stored: one byte less"},
-        {lie(0, [](entry& e) { e.size -= 1, e.crc = crc_of(content.substr(0, e.size)); }),
-         {101},
-         "stored: one byte less, and the CRC-32 agrees"},
+        {lie(0, [](entry& e) { e.crc = crc_of(content.substr(0, --e.size)); }), {101}, "stored: less, and it agrees"},
         {lie(0, [](entry& e) { e.packed_size = e.size = 0xFFFFFFFE; }), {refused}, "stored: 4 GB of it"},
         {lie(12, [](entry& e) { e.size += 1; }), {100}, "bzip2: one byte more"},
         {lie(12, [](entry& e) { e.size -= 1; }), {101}, "bzip2: one byte less"},
@@ -155,9 +142,10 @@ TEST(zip_hostile, both_headers_lie_alike) {
         {lie(12, [](entry& e) { e.packed_size -= 1; }), {101}, "bzip2: packed data cut"},
         {lie(12, [](entry& e) { e.data[0] = 'x'; }), {604}, "bzip2: no bzip2 (BZ_DATA_ERROR_MAGIC)"},
         {lie(8, [](entry& e) { e.flags = 1; }), {112}, "encrypted"},
+        {build({entry(content, 8)}, "c PK\5\6 and no record").bytes, {101}, "a comment hides the end record"},
+        {build({entry(content, 8)}, "PK\5\6 0123456789012345678901").bytes, {101}, "and with bytes for a record"},
         {lie(9, [](entry&) {}), {100}, "a method that is not read"},
         {lie(99, [](entry& e) { e.flags = 1; }), {100}, "AES: the method is looked at first"},
-        {build({entry(content, 8), entry("x", 0)}).bytes, {0}, "sound, to hold the next against"},
         {[&] {
              std::vector<entry> twins = {entry(content, 8), entry("x", 0)};
              twins[1].shift = 0 - static_cast<std::uint32_t>(build({twins[0]}).central);
@@ -173,7 +161,7 @@ TEST(zip_hostile, both_headers_lie_alike) {
     }
 }
 
-TEST(zip_hostile, zip64_is_refused_where_a_locator_says_so) {
+TEST(zip_hostile, end_record_against_its_surroundings) {
     const struct {
         std::size_t at;
         int width;
@@ -188,14 +176,9 @@ TEST(zip_hostile, zip64_is_refused_where_a_locator_says_so) {
         set_field(made.bytes, made.end + row.at, row.width, ~std::uint64_t{0});
         EXPECT_EQ(load_bytes(made.bytes).cause, row.cause) << row.at << (row.has_locator ? " with" : " without");
     }
-}
-
-TEST(zip_hostile, an_empty_directory_lies_before_its_end_record) {
-    for (const std::uint64_t offset : {0U, 1U}) {
-        archive made = build({});
-        set_field(made.bytes, made.end + 16, 4, offset);
-        EXPECT_EQ(load_bytes(made.bytes).cause, offset == 0 ? static_cast<int>(no_entry) : 101);
-    }
+    archive empty = build({});
+    set_field(empty.bytes, empty.end + 16, 4, 1);
+    EXPECT_EQ(load_bytes(empty.bytes).cause, 101) << "an empty directory behind its end record";
 }
 
 TEST(zip_hostile, cut_anywhere) {

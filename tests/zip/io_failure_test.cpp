@@ -161,19 +161,3 @@ TEST(zip_io_failure, save_fails_or_is_whole) {
             EXPECT_TRUE(is_whole()) << "call " << k;
         });
 }
-
-TEST(zip_io_failure, a_full_device_is_told_at_the_latest_by_close) {
-    if (!std::filesystem::exists("/dev/full")) GTEST_SKIP();
-    CZipArchive zip;
-    ASSERT_TRUE(zip.Open(L"/dev/full", CZipStorage::create));
-    CZipFileHeader header;
-    header.SetFileName(L"a");
-    EXPECT_EQ(cause_of([&] {
-                  zip.OpenNewFile(header);
-                  zip.CloseNewFile();
-                  zip.Close();
-              }),
-              ENOSPC);
-    zip.Close(CZipArchive::closeAfterException);
-    EXPECT_TRUE(zip.IsClosed());
-}

@@ -1,3 +1,5 @@
+// What stands under the archive classes: code pages, attributes, path splitting, files over descriptors, buffers.
+
 #include "archives.h"
 #include "hqf/platform/file_access.h"
 
@@ -8,44 +10,33 @@
 using namespace zip_test;
 
 TEST(platform_files, code_pages_keep_text_and_replace_what_is_none) {
+    const std::wstring grin = {wchar_t(0xD83D), wchar_t(0xDE00)}, half = L"\uFFFD";
+    const char utf8_grin[] = "\xF0\x9F\x98\x80";
     const struct {
-        std::wstring text;
+        std::wstring text; // empty: only the way from bytes
         std::string bytes;
         std::wstring back;
         std::uint32_t code_page;
         const char* why;
     } rows[] = {
-        {L"a/b", "a/b", L"a/b", 1, "ASCII"},
-        {L"\u00E9\u20AC", "\xC3\xA9\xE2\x82\xAC", L"\u00E9\u20AC", 0, "two and three bytes"},
-        {{wchar_t(0xD83D), wchar_t(0xDE00)}, "\xF0\x9F\x98\x80", {wchar_t(0xD83D), wchar_t(0xDE00)}, 65001, "a pair"},
-        {{wchar_t(0x1F600)}, "\xF0\x9F\x98\x80", {wchar_t(0xD83D), wchar_t(0xDE00)}, 1, "one element above U+FFFF"},
-        {{wchar_t(0xD83D), L'x'}, "\xEF\xBF\xBDx", L"\uFFFDx", 1, "half a pair"},
-        {{wchar_t(0xD83D), wchar_t(0xD83D), wchar_t(0xDE00)},
-         "\xEF\xBF\xBD\xF0\x9F\x98\x80",
-         {wchar_t(0xFFFD), wchar_t(0xD83D), wchar_t(0xDE00)},
-         1,
-         "half a pair before a pair"},
+        {L"\u00E9\u20AC/", "\xC3\xA9\xE2\x82\xAC/", L"\u00E9\u20AC/", 0, "two and three bytes, ASCII"},
+        {grin, utf8_grin, grin, 65001, "a pair"},
+        {{wchar_t(0x1F600)}, utf8_grin, grin, 1, "one element above U+FFFF"},
+        {{wchar_t(0xD83D), L'x'}, "\xEF\xBF\xBDx", half + L'x', 1, "half a pair"},
+        {wchar_t(0xD83D) + grin, std::string("\xEF\xBF\xBD") + utf8_grin, half + grin, 1, "half a pair before a pair"},
         {L"a\u00E9", "a?", L"a?", 1252, "a code page that is not known keeps ASCII"},
+        {L"", "\x84x", half + L'x', 1, "a byte of another code page"},
+        {L"", "\xC0\x80", half + half, 1, "overlong"},
+        {L"", "\xED\xA0\x80", half + half + half, 1, "a surrogate"},
+        {L"", "\xF4\x90\x80\x80", half + half + half + half, 1, "above U+10FFFF"},
+        {L"", "\xE2\x82", half + half, 1, "cut off"},
+        {L"", "\xE9", half, 850, "no ASCII"},
     };
     for (const auto& row : rows) {
-        EXPECT_EQ(hqf::to_code_page(row.text, row.code_page), row.bytes) << row.why;
         EXPECT_EQ(hqf::from_code_page(row.bytes, row.code_page), row.back) << row.why;
+        if (row.text.empty()) continue;
+        EXPECT_EQ(hqf::to_code_page(row.text, row.code_page), row.bytes) << row.why;
     }
-    const struct {
-        std::string bytes;
-        std::wstring text;
-        std::uint32_t code_page;
-        const char* why;
-    } broken[] = {
-        {"\x84x", L"\uFFFDx", 1, "a byte of another code page"},
-        {"\xC0\x80", L"\uFFFD\uFFFD", 1, "overlong"},
-        {"\xED\xA0\x80", L"\uFFFD\uFFFD\uFFFD", 1, "a surrogate"},
-        {"\xF4\x90\x80\x80", L"\uFFFD\uFFFD\uFFFD\uFFFD", 1, "above U+10FFFF"},
-        {"\xE2\x82", L"\uFFFD\uFFFD", 1, "cut off"},
-        {"\xE9", L"\uFFFD", 850, "no ASCII"},
-    };
-    for (const auto& row : broken)
-        EXPECT_EQ(hqf::from_code_page(row.bytes, row.code_page), row.text) << row.why;
 }
 
 TEST(platform_files, status_tells_dos_bits_time_and_size) {
@@ -53,23 +44,18 @@ TEST(platform_files, status_tells_dos_bits_time_and_size) {
     put(file, "12345");
     const std::wstring path = wide(file);
     hqf::file_status status;
-    ASSERT_TRUE(hqf::get_file_status(path, status));
-    EXPECT_EQ(status.attributes, 0x20U);
-    EXPECT_EQ(status.size, 5U);
     ASSERT_TRUE(hqf::set_file_time(path, 86400));
-    ASSERT_TRUE(hqf::set_file_attributes(path, 0x01));
-    ASSERT_TRUE(hqf::get_file_status(path, status));
-    EXPECT_EQ(status.attributes, 0x21U);
+    for (std::uint32_t attributes : {0x20U, 0x21U, 0x20U}) {
+        ASSERT_TRUE(hqf::set_file_attributes(path, attributes & 1));
+        ASSERT_TRUE(hqf::get_file_status(path, status));
+        EXPECT_EQ(status.attributes, attributes);
+    }
+    EXPECT_EQ(status.size, 5U);
     EXPECT_EQ(status.modified, 86400);
-    ASSERT_TRUE(hqf::set_file_attributes(path, 0x20));
-    ASSERT_TRUE(hqf::get_file_status(path, status));
-    EXPECT_EQ(status.attributes, 0x20U);
     ASSERT_TRUE(hqf::get_file_status(wide(folder()), status));
     EXPECT_EQ(status.attributes, 0x10U);
     EXPECT_FALSE(hqf::get_file_status(path + L"-none", status));
     EXPECT_FALSE(hqf::get_file_status(path + L'\0' + L"x", status)) << "a NUL must not name the file before it";
-    EXPECT_FALSE(hqf::set_file_time(path + L"-none", 0));
-    EXPECT_FALSE(hqf::set_file_attributes(path + L"-none", 0));
 }
 
 TEST(platform_files, path_component_splits) {
@@ -87,7 +73,6 @@ TEST(platform_files, path_component_splits) {
         {L"d.d/name", L"", L"", L"d.d", L"name", L"", L"name"},
         {L"dir/", L"", L"", L"dir", L"", L"", L""},
         {L"1:x", L"", L"", L"", L"1:x", L"", L"1:x"},
-        {L"", L"", L"", L"", L"", L"", L""},
     };
     for (const auto& row : rows) {
         const CZipPathComponent parts(row.path);
@@ -114,8 +99,7 @@ TEST(zip_file, flags_decide_what_open_does) {
         {false, all, 0, "", "creates"},
         {true, all, 0, "", "empties"},
         {true, all | file::modeNoTruncate, 0, "old", "keeps"},
-        {true, file::modeRead, 0, "old", "a read-only open never empties"},
-        {true, file::modeRead | file::modeCreate | file::shareDenyNone, 0, "old", "not even with the flag to create"},
+        {true, file::modeRead | file::modeCreate | file::shareDenyNone, 0, "old", "a read-only open never empties"},
         {true, file::modeWrite | file::shareDenyRead, 0, "", "write alone empties"},
     };
     for (const auto& row : rows) {
@@ -123,14 +107,7 @@ TEST(zip_file, flags_decide_what_open_does) {
         std::filesystem::remove(path);
         if (row.is_there) put(path, "old");
         CZipFile tested;
-        int cause = 0;
-        try {
-            tested.Open(wide(path), row.flags, true);
-        } catch (const CZipException& e) {
-            cause = e.GetCause();
-            EXPECT_EQ(e.GetFileName(), wide(path)) << row.why;
-        }
-        EXPECT_EQ(cause, row.cause) << row.why;
+        EXPECT_EQ(cause_of([&] { tested.Open(wide(path), row.flags, true); }), row.cause) << row.why;
         EXPECT_EQ(tested.IsClosed(), row.cause != 0) << row.why;
         EXPECT_EQ(get(path), row.content) << row.why;
     }
@@ -149,7 +126,6 @@ TEST(zip_file, reads_writes_and_fails_by_errno) {
     EXPECT_EQ(file.GetLength(), 10U);
     EXPECT_EQ(file.GetPosition(), 0U) << "the length is asked for without moving";
     file.SetLength(4);
-    file.Flush();
     CZipFile second(wide(path), 0x45);
     EXPECT_FALSE(second.IsClosed()) << "sharing is advisory";
     EXPECT_EQ(cause_of([&] { second.Write("x", 1); }), EBADF);
@@ -171,16 +147,9 @@ TEST(zip_auto_buffer, owns_copies_and_keeps_a_block_of_the_same_size) {
     EXPECT_EQ(std::string(block, 4), std::string(4, '\0'));
     block[0] = 'x';
     EXPECT_EQ(buffer.Allocate(4), block);
-    EXPECT_EQ(block[0], 'x');
-    CZipAutoBuffer copy = buffer;
-    EXPECT_NE(copy.GetBuffer(), block);
-    EXPECT_EQ(copy.GetBuffer()[0], 'x');
+    const CZipAutoBuffer copy = buffer;
     EXPECT_EQ(buffer.Allocate(4, true)[0], '\0');
-    copy = buffer;
-    EXPECT_EQ(copy.GetBuffer()[0], '\0');
+    EXPECT_EQ(copy.GetBuffer()[0], 'x') << "a copy has bytes of its own";
     EXPECT_EQ(buffer.Allocate(0), nullptr);
     EXPECT_EQ(buffer.GetSize(), 0U);
-    copy.Release();
-    EXPECT_EQ(copy.GetSize(), 0U);
-    EXPECT_EQ(copy.GetBuffer(), nullptr);
 }

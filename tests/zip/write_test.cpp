@@ -1,6 +1,11 @@
+// What an archive gets: shape, methods, names, limits, and what is left of it after a failure.
+
 #include "archives.h"
+#include "hqf/platform/file_access.h"
 
 #include <gtest/gtest.h>
+
+#include <ctime>
 
 using namespace zip_test;
 
@@ -20,54 +25,37 @@ void add(CZipArchive& zip, const std::wstring& name, const std::string& content,
     ASSERT_TRUE(zip.CloseNewFile());
 }
 
-std::string read_entry(unsigned int index) {
+/// All entries of the archive, with a bar behind each.
+std::string contents() {
     CZipArchive zip;
     zip.Open(wide(path), CZipStorage::openReadOnly);
-    std::string content(zip.GetFileInfo(index)->GetUncompressedSize(), '\0');
-    zip.OpenFile(index);
-    zip.ReadFile(content.data(), static_cast<unsigned int>(content.size()));
-    EXPECT_EQ(zip.CloseFile(), 1);
-    return content;
+    std::string all;
+    for (unsigned int i = 0; i < zip.GetCount(); ++i) {
+        std::string content(zip.GetFileInfo(i)->GetUncompressedSize(), '\0');
+        zip.OpenFile(i);
+        zip.ReadFile(content.data(), static_cast<unsigned int>(content.size()));
+        EXPECT_EQ(zip.CloseFile(), 1);
+        all += content + '|';
+    }
+    return all;
 }
 
 } // namespace
 
 TEST(zip_write, a_packed_file_has_exactly_this_shape) {
-    const auto folder_of_source = folder() / "dir";
-    std::filesystem::create_directories(folder_of_source);
+    std::tm local{};
+    local.tm_year = 124, local.tm_mon = 4, local.tm_mday = 1, local.tm_hour = 9, local.tm_isdst = -1;
+    std::filesystem::create_directories(folder() / "dir");
+    const auto source = folder() / "dir" / "a.hqf";
     for (const std::string& content : {std::string("1234"), std::string("12345"), sample_text(200000)}) {
-        const auto source = folder_of_source / "a.hqf";
         put(source, content);
-        std::tm local{};
-        local.tm_year = 124, local.tm_mon = 4, local.tm_mday = 1, local.tm_hour = 9, local.tm_sec = 31;
-        local.tm_isdst = -1;
-        std::filesystem::last_write_time(
-            source, std::chrono::file_clock::from_sys(std::chrono::system_clock::from_time_t(std::mktime(&local))));
+        ASSERT_TRUE(hqf::set_file_time(wide(source), std::mktime(&local) + 1));
         CZipArchive zip;
         ASSERT_TRUE(zip.Open(wide(path), CZipStorage::create));
-        ASSERT_TRUE(zip.SetCompressionMethod(8));
         ASSERT_TRUE(zip.AddNewFile(wide(source), -1, false, 7, 65536));
         zip.Close();
-
-        const std::string bytes = get(path);
-        const std::uint16_t method = content.size() < 5 ? 0 : 8;
-        ASSERT_GT(bytes.size(), 103U);
-        const std::string data = bytes.substr(35, bytes.size() - 35 - 51 - 22);
-        hqf::field_writer common;
-        common(std::uint16_t{20})(std::uint16_t{0})(method)(std::uint16_t{0x480F})(std::uint16_t{0x58A1});
-        common(crc_of(content))(static_cast<std::uint32_t>(data.size()))(static_cast<std::uint32_t>(content.size()));
-        common(std::uint16_t{5})(std::uint16_t{0});
-        hqf::field_writer central, end;
-        central(0x02014B50U)(std::uint16_t{46}).bytes(common.get().data(), common.get().size());
-        central(std::uint16_t{0})(std::uint16_t{0})(std::uint16_t{0})(0x81B40020U)(0U);
-        end(0x06054B50U)(0U)(std::uint16_t{1})(std::uint16_t{1})(51U);
-        end(static_cast<std::uint32_t>(35 + data.size()))(std::uint16_t{0});
-        EXPECT_TRUE(bytes == "PK\3\4" + common.get() + "a.hqf" + data + central.get() + "a.hqf" + end.get())
-            << content.size();
-        if (method == 0) {
-            EXPECT_EQ(data, content);
-        }
-        EXPECT_TRUE(load(path).content == content) << content.size();
+        const entry expected(content, content.size() < 5 ? 0 : 8);
+        EXPECT_TRUE(get(path) == build({expected}).bytes) << content.size();
     }
 }
 
@@ -78,23 +66,24 @@ TEST(zip_write, levels_choose_method_and_flags) {
     } rows[] = {{-1, 8, 0}, {0, 0, 0}, {1, 8, 6},  {2, 8, 4},  {3, 8, 0},
                 {8, 8, 2},  {9, 8, 2}, {10, 8, 0}, {-2, 8, 0}, {100, 8, 0}};
     const std::string text = sample_text(50000);
-    std::size_t default_size = 0;
     for (const auto& row : rows) {
         CZipArchive zip;
         zip.Open(wide(path), CZipStorage::create);
         add(zip, L"a", text, row.level);
         EXPECT_EQ(zip.GetFileInfo(0)->GetMethod(), row.method) << row.level;
         EXPECT_EQ(zip.GetFileInfo(0)->GetFlags(), row.flags) << row.level;
-        if (row.level == -1) default_size = zip.GetFileInfo(0)->GetCompressedSize();
-        if (row.level < -1 || row.level > 9) {
-            EXPECT_EQ(zip.GetFileInfo(0)->GetCompressedSize(), default_size) << "as the default: " << row.level;
+        if (row.level < 0 || row.level > 9) {
+            EXPECT_EQ(zip.GetFileInfo(0)->GetCompressedSize(), deflated(text).size()) << "the default: " << row.level;
         }
         zip.Close();
-        EXPECT_TRUE(read_entry(0) == text) << row.level;
+        EXPECT_TRUE(contents() == text + '|') << row.level;
     }
+    CZipFileHeader spanned;
+    spanned.PrepareData(1, true);
+    EXPECT_EQ(spanned.GetFlags(), 14) << "sizes behind the data";
 }
 
-TEST(zip_write, only_deflate_and_bzip2_can_be_chosen) {
+TEST(zip_write, misuse_is_told_by_results) {
     CZipArchive zip;
     for (const std::uint16_t method : std::initializer_list<std::uint16_t>{0, 1, 9, 14, 99})
         EXPECT_FALSE(zip.SetCompressionMethod(method)) << method;
@@ -114,7 +103,7 @@ TEST(zip_write, only_deflate_and_bzip2_can_be_chosen) {
     EXPECT_FALSE(zip.OpenNewFile(named(L"c"), 0, wide(folder() / "none"))) << "no such file";
     EXPECT_FALSE(zip.AddNewFile(wide(folder() / "none")));
     zip.Close();
-    EXPECT_EQ(read_entry(1), "");
+    EXPECT_EQ(contents(), "||");
 }
 
 TEST(zip_write, names_of_entries_come_from_the_path) {
@@ -122,28 +111,26 @@ TEST(zip_write, names_of_entries_come_from_the_path) {
     std::filesystem::create_directories(dir);
     put(dir / "file.hqf", "content");
     const std::wstring base = wide(dir);
-    std::wstring full = base.substr(1);
+    const std::string full = dir.string().substr(1);
     const struct {
         std::wstring path;
         bool full_path;
-        std::wstring name;
-        std::uint32_t external;
-    } rows[] = {
-        {base + L"/file.hqf", false, L"file.hqf", 0x81B40020},
-        {base + L"/file.hqf", true, full + L"/file.hqf", 0x81B40020},
-        {base, false, L"sub/", 0x41FD0010},
-        {base + L"//", false, L"sub/", 0x41FD0010},
-        {base + L"/", true, full + L"/", 0x41FD0010},
-    };
+        std::string name;
+    } rows[] = {{base + L"/file.hqf", false, "file.hqf"},
+                {base + L"/file.hqf", true, full + "/file.hqf"},
+                {base, false, "sub/"},
+                {base + L"//", false, "sub/"},
+                {base + L"/", true, full + "/"}};
     for (const auto& row : rows) {
         CZipArchive zip;
         zip.Open(wide(path), CZipStorage::create);
         ASSERT_TRUE(zip.AddNewFile(row.path, -1, row.full_path));
         const CZipFileHeader& header = *zip.GetFileInfo(0);
-        EXPECT_EQ(header.GetStoredName(), std::filesystem::path(row.name).string());
-        EXPECT_EQ(header.GetExternalAttr(), row.external);
-        EXPECT_EQ(header.GetMethod(), row.external == 0x41FD0010 ? 0 : 8);
-        EXPECT_EQ(header.GetVersionNeeded(), row.external == 0x41FD0010 ? 10 : 20);
+        const bool is_folder = row.name.back() == '/';
+        EXPECT_EQ(header.GetStoredName(), row.name);
+        EXPECT_EQ(header.GetExternalAttr(), is_folder ? 0x41FD0010 : 0x81B40020) << row.name;
+        EXPECT_EQ(header.GetMethod(), is_folder ? 0 : 8) << row.name;
+        EXPECT_EQ(header.GetVersionNeeded(), is_folder ? 10 : 20) << row.name;
         zip.Close();
     }
 }
@@ -162,10 +149,9 @@ TEST(zip_write, fields_of_65536_bytes_are_refused_and_leave_no_entry) {
         if (row.central != 0) header.GetCentralExtra().Add(1, bytes65532.data(), row.central);
         CZipArchive zip;
         zip.Open(wide(path), CZipStorage::create);
-        EXPECT_EQ(cause_of([&] { zip.OpenNewFile(header, 0) && zip.CloseNewFile(); }), row.cause) << row.cause;
+        EXPECT_EQ(cause_of([&] { zip.OpenNewFile(header, 0) && zip.CloseNewFile(); }), row.cause);
         zip.Close();
-        ASSERT_TRUE(zip.Open(wide(path), CZipStorage::openReadOnly));
-        EXPECT_EQ(zip.GetCount(), row.cause == 0 ? 1U : 0U);
+        EXPECT_EQ(contents(), row.cause == 0 ? "|" : "") << row.name << row.comment << row.local << row.central;
     }
 }
 
@@ -195,26 +181,28 @@ TEST(zip_write, record_of_names_is_written_only_where_it_says_something) {
         const CZipExtraData* const found = read.GetCentralExtra().Find(0x5A4C);
         EXPECT_EQ(found == nullptr ? "" : std::string(found->data.GetBuffer(), found->data.GetSize()), row.record);
         EXPECT_EQ(read.GetFileName(), L"\u00E9");
-        EXPECT_EQ(read.GetNameCodePage(), row.name_page);
-        EXPECT_EQ(read.GetCommentCodePage(), row.comment_page);
     }
 }
 
 TEST(zip_write, adds_behind_what_is_there) {
-    // An existing archive with something in front of it and a comment, which both stay.
-    put(path, "front" + build({entry("first", 8)}, "comment").bytes);
-    const std::string before = get(path);
+    // An archive made on another host, with something in front of it and a comment, which all stay.
+    entry first("first", 8);
+    first.made_by = 3 << 8 | 30;
+    const std::string before = "front" + build({first}, "comment").bytes;
+    put(path, before);
     CZipArchive zip;
     ASSERT_TRUE(zip.Open(wide(path), CZipStorage::openExisting));
     zip.Close();
     EXPECT_EQ(get(path), before) << "nothing added, nothing written";
     ASSERT_TRUE(zip.Open(wide(path), CZipStorage::openExisting));
-    add(zip, L"b", "second");
+    CZipFileHeader header = named(L"b");
+    header.SetSystemAttr(0x20);
+    ASSERT_TRUE(zip.OpenNewFile(header) && zip.CloseNewFile());
+    EXPECT_EQ(zip.GetFileInfo(1)->GetExternalAttr(), 0x81B40000U) << "a new entry takes the archive's host";
     add(zip, L"c", "third", 0);
     zip.Close();
-    EXPECT_EQ(get(path).substr(0, 5), "front");
-    EXPECT_EQ(get(path).substr(get(path).size() - 7), "comment");
-    EXPECT_EQ(read_entry(0) + read_entry(1) + read_entry(2), "firstsecondthird");
+    EXPECT_EQ(get(path).substr(0, 5) + get(path).substr(get(path).size() - 7), "frontcomment");
+    EXPECT_EQ(contents(), "first||third|");
 
     // An archive behind a file that is none.
     put(path, "a program");
@@ -223,36 +211,20 @@ TEST(zip_write, adds_behind_what_is_there) {
     add(zip, L"a", "first");
     zip.Close();
     EXPECT_EQ(get(path).substr(0, 9), "a program");
-    EXPECT_EQ(read_entry(0), "first");
-}
-
-TEST(zip_write, an_entry_takes_the_host_of_the_archive) {
-    entry e("first", 0);
-    e.made_by = 3 << 8 | 30;
-    put(path, build({e}).bytes);
-    CZipArchive zip;
-    zip.Open(wide(path), CZipStorage::openExisting);
-    CZipFileHeader header = named(L"b");
-    header.SetSystemAttr(0x20);
-    ASSERT_TRUE(zip.OpenNewFile(header) && zip.CloseNewFile());
-    EXPECT_EQ(zip.GetFileInfo(1)->GetHost(), 3);
-    EXPECT_EQ(zip.GetFileInfo(1)->GetExternalAttr(), 0x81B40000U);
+    EXPECT_EQ(contents(), "first|");
 }
 
 TEST(zip_write, an_exception_leaves_no_directory_and_a_dropped_entry_no_trace) {
-    CZipArchive zip;
-    zip.Open(wide(path), CZipStorage::create);
-    zip.OpenNewFile(named(L"a"));
-    zip.WriteNewFile("abc", 3);
-    zip.Close(CZipArchive::closeAfterException);
-    zip.Close(CZipArchive::closeAfterException);
-    EXPECT_EQ(load(path).cause, 118);
-    {
-        CZipArchive unclosed;
-        unclosed.Open(wide(path), CZipStorage::create);
-        add(unclosed, L"a", "abc");
+    for (bool closes : {true, false}) {
+        CZipArchive zip;
+        zip.Open(wide(path), CZipStorage::create);
+        add(zip, L"a", "abc");
+        zip.OpenNewFile(named(L"b"));
+        zip.WriteNewFile("abc", 3);
+        if (closes) zip.Close(CZipArchive::closeAfterException);
     }
     EXPECT_EQ(load(path).cause, 118) << "a destructor writes nothing";
+    CZipArchive zip;
     zip.Open(wide(path), CZipStorage::create);
     add(zip, L"a", "kept");
     zip.OpenNewFile(named(L"b"));
@@ -260,7 +232,7 @@ TEST(zip_write, an_exception_leaves_no_directory_and_a_dropped_entry_no_trace) {
     EXPECT_TRUE(zip.CloseNewFile(true));
     add(zip, L"c", "kept too");
     zip.Close();
-    EXPECT_EQ(read_entry(0) + read_entry(1), "keptkept too");
+    EXPECT_EQ(contents(), "kept|kept too|");
 }
 
 TEST(zip_write, holds_65535_entries_and_no_more) {
@@ -274,7 +246,6 @@ TEST(zip_write, holds_65535_entries_and_no_more) {
     zip.Close();
     ASSERT_TRUE(zip.Open(wide(path), CZipStorage::openReadOnly)) << "a count of all ones without a ZIP64 locator";
     EXPECT_EQ(zip.GetCount(), 65535U);
-    EXPECT_TRUE(zip.OpenFile(65534));
 }
 
 TEST(zip_write, time_without_a_source_is_now_and_close_can_stamp_the_file) {
@@ -283,41 +254,12 @@ TEST(zip_write, time_without_a_source_is_now_and_close_can_stamp_the_file) {
     CZipFileHeader old = named(L"old");
     old.SetTime(1000000000);
     ASSERT_TRUE(zip.OpenNewFile(old) && zip.CloseNewFile());
-    EXPECT_EQ(zip.GetFileInfo(0)->GetTime(), 1000000000);
     zip.Close(CZipArchive::closeNormal, true);
-    const auto stamp = std::filesystem::last_write_time(path);
-    EXPECT_EQ(std::chrono::file_clock::to_sys(stamp).time_since_epoch(), std::chrono::seconds(1000000000));
+    hqf::file_status status;
+    ASSERT_TRUE(hqf::get_file_status(wide(path), status));
+    EXPECT_EQ(status.modified, 1000000000);
     const std::time_t before = std::time(nullptr);
     zip.Open(wide(path), CZipStorage::create);
     ASSERT_TRUE(zip.OpenNewFile(named(L"now")));
     EXPECT_GE(zip.GetFileInfo(0)->GetTime(), before - 2);
-}
-
-TEST(zip_write, other_tools_open_what_is_written) {
-    const std::string text = sample_text(300000);
-    CZipArchive zip;
-    zip.Open(wide(path), CZipStorage::create);
-    add(zip, L"a.hqf", text);
-    add(zip, L"dir\\stored", "stored", 0);
-    CZipFileHeader dir = named(L"empty");
-    dir.SetSystemAttr(0x10);
-    ASSERT_TRUE(zip.OpenNewFile(dir) && zip.CloseNewFile());
-    zip.Close();
-    put(folder() / "expected", text);
-    const std::string archive_path = path.string();
-    const struct {
-        const char* is_there;
-        std::string command;
-    } rows[] = {
-        {"python3 -c pass",
-         "python3 -c \"import sys,zipfile as z; a=z.ZipFile(sys.argv[1]); assert a.testzip() is None; "
-         "assert a.namelist()==['a.hqf','dir/stored','empty/']; assert a.read('a.hqf')==open(sys.argv[2],'rb').read(); "
-         "assert [i.compress_type for i in a.infolist()]==[8,0,0]; assert a.infolist()[2].is_dir()\" '" +
-             archive_path + "' '" + (folder() / "expected").string() + "'"},
-        {"unzip -v > /dev/null 2>&1", "unzip -tqq '" + archive_path + "'"},
-    };
-    for (const auto& row : rows)
-        if (std::system(row.is_there) == 0) {
-            EXPECT_EQ(std::system(row.command.c_str()), 0) << row.command;
-        }
 }
