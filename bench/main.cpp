@@ -39,6 +39,10 @@ void add_rows(const subject& document) {
     add_pugixml_write(document);
 #endif
     add_hqf_objects(document);
+    if (document.which == kind::palettes || document.which == kind::spectra) {
+        add_hqf_archive(document);
+        add_zlib_archive(document);
+    }
 }
 
 void dump(const subject& document, const std::filesystem::path& folder) {

@@ -70,5 +70,7 @@ void add_hqf_objects(const subject& document);
 void add_expat_load(const subject& document);
 void add_pugixml_load(const subject& document);
 void add_pugixml_write(const subject& document);
+void add_hqf_archive(const subject& document);
+void add_zlib_archive(const subject& document);
 
 } // namespace hqf_bench

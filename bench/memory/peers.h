@@ -10,6 +10,9 @@ namespace hqf_bench {
 using memory_peer = bool (*)(const std::string& text, const std::function<void()>& while_loaded);
 
 bool load_hqf(const std::string& text, const std::function<void()>& while_loaded);
+/// Reads the file that `pack_for_load_archive` has made of the same text.
+bool load_hqf_archive(const std::string& text, const std::function<void()>& while_loaded);
+void pack_for_load_archive(const std::string& text);
 bool load_pugixml(const std::string& text, const std::function<void()>& while_loaded);
 
 } // namespace hqf_bench
