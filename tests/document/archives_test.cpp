@@ -65,6 +65,8 @@ TEST(archives, what_stands_around_and_in_the_entry) {
         made.name = entry_name;
         return made;
     };
+    entry claiming_nothing(chart, 8);
+    claiming_nothing.size = claiming_nothing.crc = 0;
     const struct {
         std::string bytes;
         const char *outcome, *why;
@@ -79,6 +81,7 @@ TEST(archives, what_stands_around_and_in_the_entry) {
         {build({named(chart, "b.txt"), named("no XML", "a.hqf")}, "", true).bytes, "0", "the directory in reverse"},
         {build({named("no XML", "b"), named(chart, "a.hqf")}).bytes, "34", "the first entry is no XML"},
         {build({entry("", 8)}).bytes, "34", "an empty entry"},
+        {build({claiming_nothing}).bytes, "1000", "an entry that claims to be empty and isn't"},
         {chart, "cause 118", "a plain document of that name"},
         {"", "cause 118", "an empty file"},
     };

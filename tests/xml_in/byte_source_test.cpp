@@ -44,8 +44,7 @@ TEST(byte_source, copies_of_memory_share_the_bytes_and_start_where_the_original_
     lmx::c_read_string original(bytes);
     original.read();
     lmx::c_read_string copy(original);
-    EXPECT_EQ(copy.read(), 'b');
-    EXPECT_EQ(original.read(), 'b') << "the copy has a cursor of its own";
+    EXPECT_TRUE(copy.read() == 'b' && original.read() == 'b') << "the copy has a cursor of its own";
     copy.rewind();
     EXPECT_EQ(copy.read(), 'a') << "and rewinds to the start of the bytes";
 }
@@ -109,16 +108,14 @@ TEST(entity_stream, values_come_in_place_of_the_document) {
     r.in.add_general_entity("a", "1\r\n2");
     r.in.add_general_entity("b", "1\r\n2");
     EXPECT_EQ(next(2), "<\n");
-    EXPECT_TRUE(push("a"));
-    EXPECT_EQ(next(1), "1") << "the later definition is read";
+    EXPECT_TRUE(push("a") && next(1) == "1") << "the later definition is read";
     EXPECT_TRUE(push("b")) << "an equal text is another entity";
     EXPECT_EQ(next(3), "1\r\n") << "line ends of a value are not folded";
     r.in.unget('\n');
     EXPECT_EQ(next(2), "\n2");
     EXPECT_EQ(r.in.get_entity_stack_depth(), 2u) << "a value counts until the read behind it";
     EXPECT_EQ(r.in.get_line_num(), 2) << "and counts no lines";
-    EXPECT_EQ(next(1), "\r");
-    EXPECT_EQ(r.in.get_entity_stack_depth(), 1u);
+    EXPECT_TRUE(next(1) == "\r" && r.in.get_entity_stack_depth() == 1);
     EXPECT_FALSE(push("a")) << "it is being read";
     EXPECT_EQ(r.errors.reports, " {0 9 Recursive entity definition for: 1\r\n2}");
     EXPECT_EQ(next(2), "\n2") << "what was begun is read to its end";
@@ -157,23 +154,20 @@ TEST(decoding, finds_the_encoding_from_the_first_bytes) {
                                                         "\xFE\xFF\x01<", "\xFF<", "\0a"s, "a<"}));
     stream.from_every_source(rows("<a>@1", {"<a>", "\xEF\xBB\xBF<a>", "\xFF\xFE<\0a\0>\0"s, "\xFE\xFF\0<\0a\0>"s}));
     stream.from_every_source(rows("@1", {"", "\xEF\xBB\xBF"}));
-    stream.from_every_source({{" \0<\0a\0"s, " <a@1", "a blank in UTF-16 little-endian without mark"},
-                              {"\0\n\0<\0a"s, "<10><a@2", "a line feed in UTF-16 big-endian without mark"},
-                              {" ", " @1", "one blank alone"},
-                              {"<\xC3\xA9>", "<\xC3\xA9>@1", "the second character may have several bytes"},
-                              {"<\xC3", "<@1", "and may be cut off"},
-                              {"\r\n<", "<10><@2", "or be the second half of a line end"},
-                              {"\n\xE2\x80\xA8<", "<10><10><@3", "or be a line separator"}});
+    stream.from_every_source({is(" \0<\0a\0"s, " <a@1", "UTF-16 without mark"),
+                              is("\0\n\0<\0a"s, "<10><a@2", "big-endian"), is(" ", " @1", "a blank alone"),
+                              is("<\xC3\xA9>", "<\xC3\xA9>@1", "several bytes"), is("<\xC3", "<@1", "cut off"),
+                              is("\r\n<", "<10><@2", "CR LF first"), is("\n\xE2\x80\xA8<", "<10><10><@3", "U+2028")});
 }
 
 TEST(decoding, folds_line_ends_and_ends_at_what_is_no_character) {
     const given stream{decoded};
     stream.from_every_source(
-        {{"<\ra\nb\r\nc\n\rd\r\n\n", "<<10>a<10>b<10>c<10><10>d<10><10>@8", "CR, LF and CR LF are one line end each"},
-         {"<\xC2\x85\xE2\x80\xA8\xE2\x80\xA9", "<<10><10>\xE2\x80\xA9@3", "U+0085 and U+2028, but not U+2029"},
-         {"<\xF0\x9D\x84\x9E", "<\xF0\x9D\x84\x9E@1", "four bytes"},
-         {"<a\xE1zzb", "<a\xE1zzb@1", "the bytes behind the second one are not looked at, nor that one always"},
-         {"<a\xE1\x82\0b"s, "<a\xE1\x82"s + "b@1", "a NUL cuts its sequence short"}});
+        {is("<\ra\nb\r\nc\n\rd\r\n\n", "<<10>a<10>b<10>c<10><10>d<10><10>@8", "CR, LF and CR LF are one line end each"),
+         is("<\xC2\x85\xE2\x80\xA8\xE2\x80\xA9", "<<10><10>\xE2\x80\xA9@3", "U+0085 and U+2028, but not U+2029"),
+         is("<\xF0\x9D\x84\x9E", "<\xF0\x9D\x84\x9E@1", "four bytes"),
+         is("<a\xE1zzb", "<a\xE1zzb@1", "the bytes behind the second one are not looked at, nor that one always"),
+         is("<a\xE1\x82\0b"s, "<a\xE1\x82"s + "b@1", "a NUL cuts its sequence short")});
     // A surrogate, a continuation byte alone, an overlong lead, five bytes, too large a number, a sequence cut off.
     stream.from_every_source(rows("<a@1", {"<a\xED\xA0\x80z", "<a\x80z", "<a\xC0\x80z", "<a\xF8\x88\x80\x80\x80z",
                                            "<a\xF4\x90\x80\x80z", "<a\xE2\x82"}));
@@ -199,37 +193,26 @@ TEST(decoding, utf16_joins_surrogates) {
 }
 
 TEST(decoding, takes_the_declared_encoding_only_where_it_fits) {
-    const std::string mismatch = "@1 {0 15 Mis-match between specfied encoding and byte format}";
-    const std::string unknown = "@1 {0 6 Unknown character encoding specified}";
+    const std::string mismatch = "refused@1 {0 15 Mis-match between specfied encoding and byte format}";
+    const std::string unknown = "refused@1 {0 6 Unknown character encoding specified}";
     const std::string big = "\0<\0a\x00\xE9\xD8\x00\x00z"s;
     const std::string little = "<\0a\0\xE9\0\x00\xD8z\0"s;
-    const struct {
-        std::string bytes;
-        const char* name;
-        std::string rest;
-    } rows[] = {{"<a\xC3\xA9", "utf-8", "\xC3\xA9@1"},
-                {"<a\xE9\x85", "ISO-8859-1", "\xC3\xA9<10>@2"},
-                {"<a\x7F\xE9", "us-ascii", "\x7F\xC3\xA9@1"},
-                {"<az", "UTF-16", mismatch},
-                {"<az", "ISO-10646-UCS-2", mismatch},
-                {"<az", "windows-1252", unknown},
-                {"<az", "UTF-8 ", unknown},
-                {big, "UTF-16", "\xC3\xA9@1" + unrecognised},
-                {big, "iso-10646-ucs-2", "\xC3\xA9\xED\xA0\x80z@1"},
-                {little, "ISO-10646-UCS-2", "\xC3\xA9\xED\xA0\x80z@1"},
-                {big, "UTF-8", mismatch},
-                {little, "ISO-8859-1", mismatch}};
-    for (const auto& row : rows) {
+    const std::string cut = "\xC3\xA9@1" + unrecognised;
+    const std::string taken = "\xC3\xA9\xED\xA0\x80z@1";
+    for (const row& r :
+         {is("<a\xC3\xA9", "\xC3\xA9@1", "utf-8"), is("<a\xE9\x85", "\xC3\xA9<10>@2", "ISO-8859-1"),
+          is("<a\x7F\xE9", "\x7F\xC3\xA9@1", "us-ascii"), is("<az", mismatch, "UTF-16"),
+          is("<az", mismatch, "ISO-10646-UCS-2"), is("<az", unknown, "windows-1252"), is("<az", unknown, "UTF-8 "),
+          is(big, cut, "UTF-16"), is(big, taken, "iso-10646-ucs-2"), is(little, taken, "ISO-10646-UCS-2"),
+          is(big, mismatch, "UTF-8"), is(little, mismatch, "ISO-8859-1")}) {
         const driver declare = [&](lmx::c_read& source) {
-            reading<lmx::c_get_as_utf8> r(source);
-            r.in.get();
-            r.in.get();
-            EXPECT_EQ(r.in.set_encoding(row.name),
-                      row.rest.find('{') == std::string::npos || row.rest.find("Unrec") != std::string::npos)
-                << row.name;
-            return rest_of(r.in) + r.errors.reports;
+            reading<lmx::c_get_as_utf8> in(source);
+            in.in.get();
+            in.in.get();
+            const bool is_taken = in.in.set_encoding(r.why.c_str());
+            return (is_taken ? "" : "refused") + rest_of(in.in) + in.errors.reports;
         };
-        given{declare}.from_every_source({{row.bytes, row.rest, row.name}});
+        given{declare}.from_every_source({r});
     }
 }
 
@@ -247,7 +230,6 @@ TEST(decoding, rewind_gives_the_same_bytes_and_lines_again) {
                 r.in.get();
             r.in.unget('x');
             r.in.rewind();
-            EXPECT_EQ(r.in.get_line_num(), 1);
             EXPECT_EQ(rest_of(r.in), first) << "after " << part;
             r.in.rewind();
         }

@@ -26,6 +26,8 @@ std::string run(const driver& drive, const std::string& text) {
 const driver content = value_in(lmx::preserve);
 const driver attribute = attribute_value_in(lmx::preserve);
 
+const std::string too_much = " {0 9 Entities expand to too much text}";
+
 // Ten entities, each ten times the one before: 10^9 times `innermost`.
 std::string laughter(const std::string& innermost) {
     std::string subset = "<!ENTITY e0 '" + innermost + "'>";
@@ -35,21 +37,20 @@ std::string laughter(const std::string& innermost) {
 }
 
 TEST(hostile, entities_that_grow) {
-    const std::string refusal = "! {0 9 Entities expand to too much text}";
     for (const char* const innermost : {"ha", "", "<!---->", "&#65;"}) {
         const std::string subset = laughter(innermost);
-        EXPECT_EQ(run(content, subset + "<a>&e9;</a>"), refusal) << "in text: " << innermost;
+        EXPECT_EQ(run(content, subset + "<a>&e9;</a>"), "!" + too_much) << "in text: " << innermost;
         EXPECT_EQ(run(attribute, subset + "<a b='&e9;'/>"), "!") << "in a value: " << innermost;
         EXPECT_EQ(run(tokens, subset + "<a xmlns='&e9;'/>"), "!@1") << "in a namespace: " << innermost;
     }
     const std::string empty = "<!DOCTYPE a [<!ENTITY e ''><!ENTITY v '" + repeat("&e;", 1000) + "'><!ENTITY w '" +
                               repeat("&v;", 100) + "'>]>";
     EXPECT_EQ(run(content, empty + "<a>&w;&w;</a>"), "()</a>");
-    EXPECT_EQ(run(content, empty + "<a>&w;&w;&w;</a>"), refusal) << "references to nothing weigh too";
+    EXPECT_EQ(run(content, empty + "<a>&w;&w;&w;</a>"), "!" + too_much) << "references to nothing weigh too";
     std::string doubled = "<!DOCTYPE a [<!ENTITY % p0 'xxxxxxxxxxxxxxxx'>";
     for (int i = 1; i < 40; ++i)
         doubled += "<!ENTITY % p" + std::to_string(i) + " '" + repeat("%p" + std::to_string(i - 1) + ";", 2) + "'>";
-    EXPECT_EQ(run(tokens, doubled + "]><a/>"), "!@1 {0 9 Entities expand to too much text}") << "parameter entities";
+    EXPECT_EQ(run(tokens, doubled + "]><a/>"), "!@1" + too_much) << "parameter entities";
     EXPECT_EQ(run(content, "<!DOCTYPE a [<!ENTITY e '.'>]><a>" + repeat("&e;", 1000000) + "</a>").size(), 1000006u)
         << "a long document may use short ones as often as it likes";
 }
@@ -62,7 +63,7 @@ TEST(hostile, entities_that_hold_themselves) {
     EXPECT_EQ(run(attribute, "<!DOCTYPE a [<!ENTITY e '&#37;e;'>]><a b='&e;'/>"),
               "! {0 9 Recursive entity definition for: %e;}")
         << "with a percent sign";
-    EXPECT_EQ(run(content, "<!DOCTYPE a [<!ENTITY e '&e'>]><a>&e;</a>"), "! {0 9 Entities expand to too much text}")
+    EXPECT_EQ(run(content, "<!DOCTYPE a [<!ENTITY e '&e'>]><a>&e;</a>"), "!" + too_much)
         << "one that ends with its reference is used up before it comes again";
 }
 
@@ -97,17 +98,6 @@ TEST(hostile, elements_nested_deeply) {
         EXPECT_EQ(r.in.get_any_element("a", &r.value, lmx::preserve, true), passes) << "capturing " << depth;
         EXPECT_TRUE(!passes || r.value == text);
     }
-}
-
-TEST(hostile, very_many_names) {
-    std::string prefixes;
-    std::string entities;
-    for (int i = 0; i < 50000; ++i) {
-        prefixes += " xmlns:p" + std::to_string(i) + "='u" + std::to_string(i) + "'";
-        entities += "<!ENTITY e" + std::to_string(i) + " '" + std::to_string(i) + "'>";
-    }
-    EXPECT_EQ(run(tokens, "<a" + prefixes + "/>"), "<a/>.@1");
-    EXPECT_EQ(run(content, "<!DOCTYPE a [" + entities + "]><a>&e49999;</a>"), "(49999)</a>");
 }
 
 } // namespace

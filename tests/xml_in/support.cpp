@@ -5,6 +5,8 @@
 
 #include <gtest/gtest.h>
 
+#include <fstream>
+
 #include <unistd.h>
 
 namespace xml_in_test {
@@ -19,15 +21,17 @@ temporary_file::temporary_file(const std::string& bytes)
         static int count = 0;
         return testing::TempDir() + "xml_in_" + std::to_string(getpid()) + "_" + std::to_string(++count);
     }()) {
-    std::FILE* const file = std::fopen(path.c_str(), "wb");
-    std::fwrite(bytes.data(), 1, bytes.size(), file);
-    std::fclose(file);
+    std::ofstream(path, std::ios::binary) << bytes;
+}
+
+row is(const std::string& bytes, const std::string& expected, const std::string& why) {
+    return {bytes, expected, why.empty() ? testing::PrintToString(bytes) : why};
 }
 
 std::vector<row> rows(const std::string& expected, const std::vector<std::string>& texts) {
     std::vector<row> out;
     for (const std::string& text : texts)
-        out.push_back({text, expected, testing::PrintToString(text)});
+        out.push_back(is(text, expected));
     return out;
 }
 

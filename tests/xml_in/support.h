@@ -72,6 +72,9 @@ struct row {
     std::string why;
 };
 
+/// A row that is explained by its bytes where nothing else is said.
+row is(const std::string& bytes, const std::string& expected, const std::string& why = {});
+
 /// The same for many texts that give the same.
 std::vector<row> rows(const std::string& expected, const std::vector<std::string>& texts);
 
