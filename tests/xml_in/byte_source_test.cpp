@@ -54,9 +54,7 @@ TEST(byte_source, a_missing_file_is_not_open_and_reads_as_ended) {
     EXPECT_FALSE(file.is_open());
     EXPECT_EQ(file.read(), -1);
     EXPECT_STREQ(file.get_source_id(), "/nowhere/at all.hqf");
-    EXPECT_STREQ(lmx::c_read_file(L"/nowhere/\xD834\xDD1E\xE9").get_source_id(),
-                 "/nowhere/\xED\xA0\xB4\xED\xB4\x9E\xC3\xA9")
-        << "each unit by itself";
+    EXPECT_STREQ(lmx::c_read_file(L"/no/\xD834\xDD1E\xE9").get_source_id(), "/no/\xED\xA0\xB4\xED\xB4\x9E\xC3\xA9");
 }
 
 TEST(byte_source, files_by_wide_path_and_by_handle) {
@@ -70,8 +68,7 @@ TEST(byte_source, files_by_wide_path_and_by_handle) {
     std::FILE* const handle = std::fopen(on_disk.path.c_str(), "rb");
     {
         lmx::c_read_file file(handle);
-        EXPECT_STREQ(file.get_source_id(), "");
-        EXPECT_EQ(file.read(), 'x');
+        EXPECT_TRUE(file.get_source_id() == ""s && file.read() == 'x');
         file.leave_file_open_on_delete(true);
     }
     std::rewind(handle);

@@ -61,8 +61,7 @@ TEST(hostile, entities_that_hold_themselves) {
     EXPECT_EQ(run(content, two + "<a>&e;</a>"), report);
     EXPECT_EQ(run(attribute, two + "<a b='&e;'/>"), report);
     EXPECT_EQ(run(attribute, "<!DOCTYPE a [<!ENTITY e '&#37;e;'>]><a b='&e;'/>"),
-              "! {0 9 Recursive entity definition for: %e;}")
-        << "with a percent sign";
+              "! {0 9 Recursive entity definition for: %e;}");
     EXPECT_EQ(run(content, "<!DOCTYPE a [<!ENTITY e '&e'>]><a>&e;</a>"), "!" + too_much)
         << "one that ends with its reference is used up before it comes again";
 }

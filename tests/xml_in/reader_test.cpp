@@ -107,7 +107,6 @@ TEST(reader, namespaces) {
     EXPECT_EQ(reader.get_namespace("xml:x", &reader.value_buffer), "http://www.w3.org/XML/1998/namespace");
     EXPECT_EQ(reader.find_enumerated_namespace("urn:m"), 1001) << "after the table's own 1000";
     EXPECT_EQ(reader.find_enumerated_namespace("urn:none"), 0);
-    EXPECT_EQ(reader.find_namespace_from_id(7), nullptr);
 }
 
 TEST(reader, scopes_find_prefixes_and_numbers) {
@@ -231,7 +230,6 @@ TEST(reader, of_a_file) {
     const temporary_file on_disk("<item/>");
     lmx::c_xml_reader_file by_wide_path(std::wstring(on_disk.path.begin(), on_disk.path.end()).c_str());
     lmx::c_xml_reader_file by_handle(std::fopen(on_disk.path.c_str(), "rb"));
-    EXPECT_TRUE(by_wide_path.is_open() && by_handle.is_open());
     EXPECT_EQ(walk(by_wide_path) + walk(by_handle), "14#1item 0(34)14#1item 0(34)");
     EXPECT_EQ(by_wide_path.get_source_id(), on_disk.path);
     EXPECT_FALSE(lmx::c_xml_reader_file("/nowhere.hqf").is_open());

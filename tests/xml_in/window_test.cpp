@@ -43,6 +43,7 @@ TEST(window, gives_the_bytes_and_lines_of_the_general_path_also_over_blocks_of_a
                 const int c = general.in.get();
                 ends = c == -1 ? ends + 1 : 0;
                 ASSERT_EQ(fast.in.get(), c);
+                if (c != -1 && random() % 3 == 0) fast.in.unget(c), general.in.unget(c);
             } else {
                 const char* const from = w->mark();
                 std::string_view piece;
@@ -86,16 +87,6 @@ TEST(window, proves_only_what_the_general_path_leaves_as_it_is) {
                         ASSERT_EQ(general.in.get(), static_cast<unsigned char>(c)) << "lead " << lead;
                 }
     EXPECT_GT(proven, 1000) << "the comparison must be about something";
-}
-
-TEST(window, proves_all_plain_text_wherever_it_stands) {
-    const std::string plain[] = {"\t\n\v\f\r", "\x7F", "\xC2\x84", "\xE2\x80\xA7", "\xED\x9F\xBF", "\xF4\x8F\xBF\xBF"};
-    for (std::size_t before = 0; before < 40; ++before)
-        for (const std::string& bytes : plain) {
-            const std::string text = std::string(before, 'x') + bytes + std::string(100, 'y');
-            const char* const stop = text.data() + before + bytes.size() + 20;
-            EXPECT_EQ(hqf::find_not_plain(text.data(), stop), stop) << testing::PrintToString(bytes) << before;
-        }
 }
 
 TEST(window, opens_only_where_the_library_may_read_ahead) {
