@@ -1,7 +1,6 @@
 /// Load and write operations of the root class.
 
 #include <cwchar>
-#include <fstream>
 
 #include "hqf/document/SdkInformationStamper.h"
 #include "hqf/document/XMLDocumentResult.h"
@@ -25,21 +24,16 @@ bool hasSuffix(const std::wstring& path, const std::wstring& suffix) {
     return path.size() >= suffix.size() && path.compare(path.size() - suffix.size(), suffix.size(), suffix) == 0;
 }
 
+/// Stamps before the first element is written, but behind the opening of a file: one that can't be opened leaves no
+/// stamp.
+lmx::elmx_error marshal_stamped(void* object, lmx::c_xml_writer& writer, const char* name) {
+    auto& document = *static_cast<Hqf*>(object);
+    SdkInformationStamper().stampWrite(document);
+    return document.marshal(writer, name);
+}
+
 lmx::elmx_error writeXmlFile(Hqf& document, const std::wstring& path) {
-    const std::string file_name = hqf::path_to_utf8(path);
-    std::ofstream stream(file_name, std::ios::out | std::ios::trunc);
-    if (!stream.is_open()) return lmx::err_unable_to_open_file;
-    lmx::elmx_error error;
-    {
-        lmx::c_xml_writer writer(stream, lmx::c_xml_writer::include_xml_decl, hqf::frame::layout_tab,
-                                 hqf::frame::layout_newline);
-        SdkInformationStamper().stampWrite(document);
-        error = document.marshal(writer, root_name);
-    }
-    stream.close();
-    if (error == lmx::err_no_error && stream.fail()) error = lmx::err_undefined_error;
-    if (error != lmx::err_no_error) hqf::remove_file(path);
-    return error;
+    return hqf::frame::write_file(hqf::path_to_utf8(path).c_str(), &document, root_name, marshal_stamped);
 }
 
 } // namespace
@@ -68,10 +62,7 @@ lmx::elmx_error Hqf::writeFile(const std::wstring& path) {
 
 XMLDocumentResult Hqf::writeString() {
     hqf::text_stream stream;
-    lmx::c_xml_writer writer(stream, lmx::c_xml_writer::include_xml_decl, hqf::frame::layout_tab,
-                             hqf::frame::layout_newline);
-    SdkInformationStamper().stampWrite(*this);
-    const lmx::elmx_error error = marshal(writer, root_name);
+    const lmx::elmx_error error = hqf::frame::write_stream(stream, this, root_name, marshal_stamped);
     std::wstring text;
     if (error == lmx::err_no_error) hqf::assign_wide(text, stream.text().data(), stream.text().size());
     return XMLDocumentResult(std::move(text), error);

@@ -39,9 +39,9 @@ model_class& made(child_pointer<model_class>& member) {
     return *member.get();
 }
 
-/// The same object for a caller that only looks: made if it isn't there, so that its address never changes, but not marked
-/// present. Two threads may look at one object at a time.
-template <class model_class>
+/// The same object for a caller that only looks: made if it isn't there, so that its address never changes, but not
+/// marked present. Two threads may look at one object at a time.
+template<class model_class>
 const model_class& made_to_look_at(const child_pointer<model_class>& member) {
     // The pointer is the one thing that looking may change.
     const std::atomic_ref<void*> object(const_cast<void*&>(member.object));

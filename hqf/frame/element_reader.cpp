@@ -30,13 +30,6 @@ private:
     unsigned int& depth_;
 };
 
-bool is_group(kind what) {
-    return what == kind::group || what == kind::group_pointer || what == kind::group_list;
-}
-bool repeats(kind what) {
-    return what == kind::text_list || what == kind::moment_list || what == kind::child_list || what == kind::group_list;
-}
-
 } // namespace
 
 bool element_reader::report(lmx::elmx_error code, const std::string& item, int line) {
@@ -235,17 +228,17 @@ bool element_reader::children() {
 bool element_reader::child_of_row(row_cursor& at) {
     const row& r = rows_.rows[at.row];
     const bool is_next =
-        is_group(r.what) ? is_member(*r.type, reader_) : event() == r.name->event && (!at.seen || repeats(r.what));
+        r.is_group() ? is_member(*r.type, reader_) : event() == r.name->event && (!at.seen || r.is_list());
     if (is_next) {
         successors_ = rows_.events_from(at.row);
         at.seen = true;
-        if (!repeats(r.what)) at.next_row();
+        if (!r.is_list()) at.next_row();
         return read_child(r);
     }
     const bool seen = at.seen;
     at.next_row();
     if (seen || !r.has(mandatory_row) || r.what == kind::group_list) return true;
-    if (!is_group(r.what)) return report(lmx::err_mandatory_element_missing, r.name->qualified(), __LINE__);
+    if (!r.is_group()) return report(lmx::err_mandatory_element_missing, r.name->qualified(), __LINE__);
     successors_ = rows_.events_from(at.row - 1);
     return read_single_group(r);
 }
@@ -326,7 +319,7 @@ bool element_reader::simple_value(const row& r, kind what, void* value, bool& st
 bool element_reader::minimums_at_end() {
     for (unsigned int i = 0; i < rows_.row_count; ++i) {
         const row& r = rows_.rows[i];
-        if (!repeats(r.what) || !r.has(mandatory_row) || member_at<list_base>(object_, r.value).size() != 0) continue;
+        if (!r.is_list() || !r.has(mandatory_row) || member_at<list_base>(object_, r.value).size() != 0) continue;
         if (!in_hand_ && !next_event()) return false;
         if (!report(lmx::err_mandatory_element_missing, rows_.item, __LINE__)) return false;
     }

@@ -12,15 +12,6 @@ namespace hqf::frame {
 
 namespace {
 
-bool repeats(const row& r) {
-    return r.what == kind::text_list || r.what == kind::moment_list || r.what == kind::child_list ||
-           r.what == kind::group_list;
-}
-
-bool is_group(const row& r) {
-    return r.what == kind::group || r.what == kind::group_pointer || r.what == kind::group_list;
-}
-
 /// The window with the '<' of a tag at its position, or null.
 window* next_tag(lmx::c_xml_reader& reader) {
     window* const in = reader_access::begin_element(reader);
@@ -118,7 +109,7 @@ void element_reader::fast_children(row_cursor& at) {
         successors_ = rows_.events_from(found.row);
         at = found;
         at.seen = true;
-        if (!repeats(*r)) at.next_row();
+        if (!r->is_list()) at.next_row();
     }
 }
 
@@ -135,7 +126,7 @@ bool element_reader::is_rest_optional(row_cursor at) const {
 const row* element_reader::find_row(const window& in, row_cursor& at, int& member) const {
     for (; at.row < rows_.row_count; at.next_row()) {
         const row& r = rows_.rows[at.row];
-        if (is_group(r)) {
+        if (r.is_group()) {
             member = find_member(in, *r.type);
             if (member >= 0) return &r;
         } else if (r.name != nullptr && starts(in, *r.name)) {

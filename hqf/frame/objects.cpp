@@ -57,14 +57,6 @@ bool equal_items(const row& r, const void* a, const void* b) {
     }
 }
 
-bool is_list(kind what) {
-    return what == kind::text_list || what == kind::moment_list || what == kind::any_list || what == kind::child_list ||
-           what == kind::group_list;
-}
-bool is_pointer(kind what) {
-    return what == kind::child_pointer || what == kind::group_pointer;
-}
-
 bool& flag_of(const row& r, void* object) {
     return member_at<bool>(object, r.flag);
 }
@@ -82,11 +74,11 @@ void copy_list(const row& r, void* to, const void* from) {
 }
 
 void copy_row(const row& r, void* to, const void* from) {
-    if (is_list(r.what)) return copy_list(r, to, from);
+    if (r.is_list()) return copy_list(r, to, from);
     const bool is_value = with_value_type(r.what, [&]<class value_type>(value_type*) {
         member_at<value_type>(to, r.value) = member_at<value_type>(from, r.value);
     });
-    if (is_pointer(r.what)) {
+    if (r.is_pointer()) {
         const void* const source = member_at<void*>(from, r.value);
         void* copy = nullptr;
         if (source != nullptr)
@@ -104,12 +96,12 @@ void copy_row(const row& r, void* to, const void* from) {
 }
 
 void swap_row(const row& r, void* a, void* b) noexcept {
-    if (is_list(r.what)) return member_at<list_base>(a, r.value).swap(member_at<list_base>(b, r.value));
+    if (r.is_list()) return member_at<list_base>(a, r.value).swap(member_at<list_base>(b, r.value));
     const bool is_value = with_value_type(r.what, [&]<class value_type>(value_type*) {
         using std::swap;
         swap(member_at<value_type>(a, r.value), member_at<value_type>(b, r.value));
     });
-    if (is_pointer(r.what))
+    if (r.is_pointer())
         std::swap(member_at<void*>(a, r.value), member_at<void*>(b, r.value));
     else if (!is_value)
         swap_members(*r.type, &member_at<char>(a, r.value), &member_at<char>(b, r.value));
@@ -117,7 +109,7 @@ void swap_row(const row& r, void* a, void* b) noexcept {
 }
 
 bool equal_rows(const row& r, const void* a, const void* b) {
-    if (is_list(r.what)) {
+    if (r.is_list()) {
         const auto& left = member_at<list_base>(a, r.value);
         const auto& right = member_at<list_base>(b, r.value);
         if (left.size() != right.size()) return false;
@@ -133,7 +125,7 @@ bool equal_rows(const row& r, const void* a, const void* b) {
         equal = same(member_at<value_type>(a, r.value), member_at<value_type>(b, r.value));
     });
     if (is_value) return equal;
-    if (!is_pointer(r.what)) return equal_members(*r.type, &member_at<char>(a, r.value), &member_at<char>(b, r.value));
+    if (!r.is_pointer()) return equal_members(*r.type, &member_at<char>(a, r.value), &member_at<char>(b, r.value));
     const void* left = member_at<void*>(a, r.value);
     const void* right = member_at<void*>(b, r.value);
     return left == nullptr || right == nullptr ? left == right : equal_members(*r.type, left, right);
@@ -141,7 +133,7 @@ bool equal_rows(const row& r, const void* a, const void* b) {
 
 bool is_row_ok(const row& r, const void* object) {
     if (!r.has(mandatory_row) || r.has(not_counted)) return true;
-    return is_list(r.what) ? member_at<list_base>(object, r.value).size() != 0 : flag_of(r, object);
+    return r.is_list() ? member_at<list_base>(object, r.value).size() != 0 : flag_of(r, object);
 }
 
 choice_slot& choice_of(const class_rows& rows, void* object) {

@@ -12,8 +12,8 @@ void copy_members(const class_rows& rows, void* to, const void* from);
 
 void swap_members(const class_rows& rows, void* a, void* b) noexcept;
 
-/// The same is set, and to the same values; NaN equals NaN, and -0.0 differs from 0.0. What is unset or absent in both, and
-/// what stands in two nil objects, plays no part.
+/// The same is set, and to the same values; NaN equals NaN, and -0.0 differs from 0.0. What is unset or absent in both,
+/// and what stands in two nil objects, plays no part.
 bool equal_members(const class_rows& rows, const void* a, const void* b);
 
 /// All mandatory members are set, each list has its minimum, a choice has an option; a nil object passes.

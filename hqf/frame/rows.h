@@ -143,6 +143,14 @@ struct row {
     const class_rows* type;
 
     constexpr bool has(row_flag asked) const { return (flags & asked) != 0; }
+    constexpr bool is_list() const {
+        return what == kind::text_list || what == kind::moment_list || what == kind::any_list ||
+               what == kind::child_list || what == kind::group_list;
+    }
+    constexpr bool is_group() const {
+        return what == kind::group || what == kind::group_pointer || what == kind::group_list;
+    }
+    constexpr bool is_pointer() const { return what == kind::child_pointer || what == kind::group_pointer; }
 };
 static_assert(sizeof(row) == 40);
 

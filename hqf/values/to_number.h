@@ -17,14 +17,6 @@ namespace hqf {
 /// \returns the end of the form; null, with nothing stored, where none begins
 const char* scan_double(const char* begin, const char* end, double& value);
 
-/// Whether the whole span is a float form, which is when its value is stored.
-inline bool read_double(const char* begin, const char* end, double& value) {
-    double scanned = 0;
-    if (begin == end || scan_double(begin, end, scanned) != end) return false;
-    value = scanned;
-    return true;
-}
-
 /// Whether the whole span is an integer form of at most 18 digits, which is when its value is stored. False says no
 /// more than that the long road must decide.
 bool read_short_integer(const char* begin, const char* end, std::int64_t& value);

@@ -45,9 +45,6 @@ struct reader_access {
         if (c != -1) reader.getter_.unget(c);
         return c == -1;
     }
-    /// Whether an element, an end tag or text has been met.
-    static bool is_past_prolog(const lmx::c_xml_reader& reader) { return reader.is_past_prolog_; }
-    static void set_event(lmx::c_xml_reader& reader, int event) { reader.current_event_ = event; }
     /// Sets the name read last, known to have this namespace number.
     ///
     /// \param prefix_length bytes in front of the colon; 0 for a name without one

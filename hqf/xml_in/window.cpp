@@ -17,7 +17,7 @@ constexpr std::ptrdiff_t margin = 64 + 4;
 // Bytes proven at a time.
 constexpr std::ptrdiff_t chunk = 16 * 1024;
 // A file is read on when fewer bytes than this lie ahead, in blocks of the larger size. Values that don't fit are left
-// to the general path, or to `grow`.
+// to the general path.
 constexpr std::size_t fair_run = 64 * 1024;
 constexpr std::size_t file_block = 256 * 1024;
 
@@ -91,17 +91,6 @@ void window::close() {
     run_->cursor = p;
     owner_.run_ = run_;
     is_open_ = false;
-}
-
-bool window::grow() {
-    if (file_ == nullptr || end_ - edge_ > margin || !file_->may_have_more()) return false;
-    const std::size_t wanted = 2 * static_cast<std::size_t>(end_ - p);
-    close();
-    const std::ptrdiff_t proven = edge_ - p;
-    file_->read_ahead(wanted, std::max(wanted, file_block));
-    edge_ = run_->cursor + proven;
-    edge_generation_ = file_->taken_from_file_;
-    return open();
 }
 
 bool window::prove_more() {

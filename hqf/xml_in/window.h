@@ -22,7 +22,7 @@ namespace hqf {
 ///
 /// A window reports nothing and decides nothing. Its operations either do what they say or change nothing; whoever gets
 /// false goes back to a mark and lets the general path read the same bytes. Only `begin_step` moves bytes in memory:
-/// marks and pieces last until its next call, or `grow`'s.
+/// marks and pieces last until its next call.
 class window {
 public:
     explicit window(lmx::c_get_as_utf8& owner)
@@ -63,9 +63,6 @@ public:
     /// Gives the bytes up to `stop`, which stays next. False if a '&' or a CR comes first, or bytes that can't be
     /// proven. Line feeds and tabs may be among them.
     bool text(char stop, std::string_view& piece);
-    /// After a failure for want of bytes (not for a doubtful one): reads at least twice as many. `p` must be back at
-    /// the start of the step; marks are lost. False when there are no more.
-    bool grow();
 
     /// The line at `p`. Lines are counted when someone asks, each byte once but for those of the current step.
     int line();

@@ -82,34 +82,26 @@ void output::value(const std::wstring& text) {
     }
 }
 
+/// A number through the stream where a caller has changed how it writes numbers, else straight into the block.
+template<class number, class stream_form>
+void output::put_number(number value, const stream_form& in_stream) {
+    if (!standard_numbers_) {
+        flush();
+        stream_ << in_stream;
+        return;
+    }
+    reserve(number_text_size);
+    at_ = write_number(at_, value);
+}
+
 void output::value(double number) {
-    if (!standard_numbers_) {
-        flush();
-        stream_ << lmx::c_as_xml(number);
-        return;
-    }
-    reserve(number_text_size);
-    at_ = write_number(at_, number);
+    put_number(number, lmx::c_as_xml(number));
 }
-
 void output::value(int number) {
-    if (!standard_numbers_) {
-        flush();
-        stream_ << number;
-        return;
-    }
-    reserve(number_text_size);
-    at_ = write_number(at_, number);
+    put_number(number, number);
 }
-
 void output::value(unsigned int number) {
-    if (!standard_numbers_) {
-        flush();
-        stream_ << number;
-        return;
-    }
-    reserve(number_text_size);
-    at_ = write_number(at_, number);
+    put_number(number, number);
 }
 
 void output::value(const lmx::c_datetime& moment) {

@@ -92,6 +92,8 @@ private:
     }
     void make_room();
     void take_room();
+    template<class number, class stream_form>
+    void put_number(number value, const stream_form& in_stream);
     void indent_slowly();
     void indent_through_writer();
     void line_end_through_writer();

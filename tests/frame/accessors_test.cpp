@@ -7,6 +7,8 @@
 #include <memory>
 #include <sstream>
 #include <string>
+#include <thread>
+#include <vector>
 
 #include "hqf/hqf.h"
 
@@ -298,6 +300,33 @@ TEST(accessors, swap_reset_and_equality) {
     EXPECT_TRUE(hqf::equal(a, ColorType()));
     c.reset();
     EXPECT_TRUE(hqf::equal(c, a));
+}
+
+/// Distinct documents need no lock, and several threads may look at one, at children that are made for it too.
+TEST(accessors, threads) {
+    std::string text;
+    Hqf shared;
+    auto& header = shared.get_Preamble().get_Header();
+    header.set_Creator(L"c");
+    header.set_CreatorVersion(L"1");
+    header.set_Purpose(L"p");
+    header.append_ChangeHistory("2024-01-01T00:00:00Z");
+    ASSERT_EQ(shared.marshal(&text), 0);
+    std::vector<const void*> seen(4);
+    std::vector<std::thread> threads;
+    for (const void*& mine : seen)
+        threads.emplace_back([&text, &mine, &looked_at = std::as_const(shared)] {
+            for (int round = 0; round < 50; ++round) {
+                Hqf own;
+                std::string again;
+                if (own.unmarshal(text) == 0 && own.marshal(&again) == 0 && again == text && hqf::equal(own, looked_at))
+                    mine = &looked_at.get_Preamble().get_Owner();
+            }
+        });
+    for (std::thread& thread : threads)
+        thread.join();
+    for (const void* const address : seen)
+        EXPECT_EQ(address, &std::as_const(shared).get_Preamble().get_Owner()) << "all saw the one child";
 }
 
 /// A class of the application that asks the pieces of its base.

@@ -3,6 +3,8 @@
 
 #include <gtest/gtest.h>
 
+#include <cstdio>
+#include <fstream>
 #include <map>
 #include <random>
 #include <string>
@@ -164,6 +166,33 @@ TEST(two_roads, cut_documents) {
     const std::string text = support::document("syntax/plain.hqf");
     for (std::size_t size = 0; size <= text.size(); ++size)
         expect_same_on_both_roads(text.substr(0, size), "cut at " + std::to_string(size));
+}
+
+/// Files come in blocks of 256 KB. Blanks in front of the content move the edge of the first one over every byte of it.
+TEST(two_roads, block_edges_of_files) {
+    constexpr std::size_t block = 256 * 1024;
+    std::string text = support::document("syntax/plain.hqf");
+    const std::size_t broken = text.find("</Hqf:Purpose>");
+    const std::size_t content = text.find("<Hqf:Preamble>");
+    ASSERT_NE(broken, std::string::npos);
+    text.insert(broken, "&nope;");
+    const char* const path = "block_edges.hqf";
+    for (std::size_t shift = 0; shift < text.size() - content; ++shift) {
+        const std::string padded =
+            text.substr(0, content) + std::string(block - content - shift, ' ') + text.substr(content);
+        {
+            std::ofstream file(path, std::ios::binary);
+            file << padded;
+        }
+        outcome from_file, from_memory;
+        lmx::c_read_file file(path);
+        lmx::c_read_memory memory(padded.data(), static_cast<unsigned int>(padded.size()));
+        load(file, true, from_file);
+        load(memory, true, from_memory);
+        ASSERT_EQ(from_file.log, from_memory.log) << "edge at byte " << shift << " of the content";
+        ASSERT_TRUE(hqf::equal(from_file.document, from_memory.document)) << "edge at byte " << shift;
+    }
+    std::remove(path);
 }
 
 /// The document of every element and attribute, cut into documents of one colour, palette or record each.
