@@ -64,7 +64,11 @@ XMLDocumentResult Hqf::writeString() {
     hqf::text_stream stream;
     const lmx::elmx_error error = hqf::frame::write_stream(stream, this, root_name, marshal_stamped);
     std::wstring text;
-    if (error == lmx::err_no_error) hqf::assign_wide(text, stream.text().data(), stream.text().size());
+    if (error == lmx::err_no_error) {
+        std::string utf8;
+        stream.move_to(utf8);
+        hqf::assign_wide(text, utf8.data(), utf8.size());
+    }
     return XMLDocumentResult(std::move(text), error);
 }
 

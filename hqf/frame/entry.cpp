@@ -20,7 +20,7 @@ lmx::elmx_error write_file(const char* file_name, void* object, const char* name
 lmx::elmx_error write_string(std::string* out, void* object, const char* name, write_call write) {
     text_stream stream;
     const lmx::elmx_error error = write_stream(stream, object, name, write);
-    if (error == lmx::err_no_error) out->assign(stream.text());
+    if (error == lmx::err_no_error) stream.move_to(*out);
     return error;
 }
 

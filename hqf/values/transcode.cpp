@@ -1,7 +1,10 @@
 #include "hqf/values/transcode.h"
 
+#include <algorithm>
 #include <cstdint>
 #include <cstring>
+
+#include "hqf/platform/pages.h"
 
 namespace hqf {
 
@@ -84,6 +87,29 @@ char* encode(const wchar_t* in, const wchar_t* end, char* out) {
     return out;
 }
 
+void widen(const char* data, std::size_t size, wchar_t* to) {
+    for (std::size_t i = 0; i < size; ++i)
+        to[i] = static_cast<wchar_t>(data[i]);
+}
+
+void append_ascii(std::wstring& out, const char* data, std::size_t size) {
+    constexpr std::size_t step = 1024;
+    const std::size_t before = out.size();
+    if (size <= step) {
+        out.resize(before + size);
+        return widen(data, size, out.data() + before);
+    }
+    // By way of a piece that stays in the cache: resize() would have all of a long text written twice.
+    out.reserve(before + size);
+    expect_filling(out.data() + before, size * sizeof(wchar_t));
+    wchar_t piece[step];
+    for (std::size_t done = 0; done < size; done += step) {
+        const std::size_t count = std::min(step, size - done);
+        widen(data + done, count, piece);
+        out.append(piece, count);
+    }
+}
+
 } // namespace
 
 std::size_t decode_sequence(const char* in, const char* end, char32_t& value) {
@@ -110,13 +136,11 @@ std::size_t decode_sequence(const char* in, const char* end, char32_t& value) {
 
 void append_wide(std::wstring& out, const char* data, std::size_t size) {
     const std::size_t run = ascii_run(data, size);
-    const std::size_t before = out.size();
-    out.resize(before + run + (run == size ? 0 : wide_bound(data + run, size - run)));
-    wchar_t* const to = out.data() + before;
-    for (std::size_t i = 0; i < run; ++i)
-        to[i] = static_cast<wchar_t>(data[i]);
+    append_ascii(out, data, run);
     if (run == size) return;
-    const wchar_t* const end = decode(data + run, data + size, to + run);
+    const std::size_t before = out.size();
+    out.resize(before + wide_bound(data + run, size - run));
+    const wchar_t* const end = decode(data + run, data + size, out.data() + before);
     out.resize(static_cast<std::size_t>(end - out.data()));
 }
 

@@ -1,34 +1,58 @@
 #include "hqf/xml_out/text_stream.h"
 
 #include <algorithm>
-#include <climits>
 #include <cstdlib>
 #include <cstring>
 #include <new>
+#include <utility>
+
+#include "hqf/platform/pages.h"
 
 namespace hqf {
 
+namespace {
+
+/// Blocks grow from one that a small document fills to one that a large document notes no more.
+constexpr std::size_t first_block = 64 * 1024, largest_block = 4 * 1024 * 1024;
+/// What the put position of a stream buffer can be moved by in one step.
+constexpr std::size_t most_at_once = 1024 * 1024 * 1024;
+
+} // namespace
+
 text_buffer::~text_buffer() {
-    std::free(pbase());
+    for (const block& each : blocks_)
+        std::free(each.begin);
 }
 
-void text_buffer::move_to(std::size_t position) {
-    setp(pbase(), epptr());
-    for (; position > INT_MAX; position -= INT_MAX)
-        pbump(INT_MAX);
-    pbump(static_cast<int>(position));
+void text_buffer::begin_block(std::size_t size) {
+    note_use();
+    const std::size_t usual = std::min(first_block << std::min<std::size_t>(blocks_.size(), 8), largest_block);
+    const std::size_t capacity = std::max(usual, size);
+    blocks_.reserve(blocks_.size() + 1);
+    void* const place = allocate_for_filling(capacity);
+    if (place == nullptr) throw std::bad_alloc();
+    char* const begin = static_cast<char*>(place);
+    blocks_.push_back({begin, 0});
+    setp(begin, begin + capacity);
 }
 
-void text_buffer::grow(std::size_t size) {
-    constexpr std::size_t least = 64 * 1024;
-    const std::size_t used = text().size();
-    const std::size_t capacity = std::max({least, 2 * used, used + size});
-    // A large block is moved by its pages, not by its bytes.
-    void* const block = std::realloc(pbase(), capacity);
-    if (block == nullptr) throw std::bad_alloc();
-    char* const start = static_cast<char*>(block);
-    setp(start, start + capacity);
-    move_to(used);
+void text_buffer::move_to(std::string& text) {
+    note_use();
+    std::size_t size = 0;
+    for (const block& each : blocks_)
+        size += each.used;
+    std::string roomy;
+    if (text.capacity() < size) {
+        roomy.reserve(size);
+        expect_filling(roomy.data(), size);
+        text.swap(roomy);
+    }
+    text.clear();
+    for (const block& each : std::exchange(blocks_, {})) {
+        text.append(each.begin, each.used);
+        std::free(each.begin);
+    }
+    setp(nullptr, nullptr);
 }
 
 text_buffer::int_type text_buffer::overflow(int_type c) {
@@ -39,9 +63,14 @@ text_buffer::int_type text_buffer::overflow(int_type c) {
 }
 
 std::streamsize text_buffer::xsputn(const char* data, std::streamsize size) {
-    char* const at = room(static_cast<std::size_t>(size));
-    std::memcpy(at, data, static_cast<std::size_t>(size));
-    advance(at + size);
+    for (std::size_t left = static_cast<std::size_t>(size); left != 0;) {
+        const std::size_t step = std::min(left, most_at_once);
+        char* const at = room(step);
+        std::memcpy(at, data, step);
+        advance(at + step);
+        data += step;
+        left -= step;
+    }
     return size;
 }
 
