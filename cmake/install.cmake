@@ -6,8 +6,8 @@ set(package_dir ${CMAKE_INSTALL_LIBDIR}/cmake/hqf)
 
 install(TARGETS hqf EXPORT hqfTargets LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR})
 
-# Users see every header but the engine's, of which the model classes include two. Should they come to include a
-# third, the install test tells: it compiles all installed headers.
+# Users see every header but the engine's, of which the model classes include three. Should they come to include a
+# fourth, the install test tells: it compiles all installed headers.
 foreach(root ${PROJECT_SOURCE_DIR}/hqf ${PROJECT_BINARY_DIR}/generated/hqf)
   install(DIRECTORY ${root} DESTINATION ${CMAKE_INSTALL_INCLUDEDIR} FILES_MATCHING PATTERN "*.h"
           PATTERN frame EXCLUDE
@@ -15,6 +15,7 @@ foreach(root ${PROJECT_SOURCE_DIR}/hqf ${PROJECT_BINARY_DIR}/generated/hqf)
           REGEX "/model/tables\\.h$" EXCLUDE)
 endforeach()
 install(FILES ${PROJECT_SOURCE_DIR}/hqf/frame/storage.h ${PROJECT_SOURCE_DIR}/hqf/frame/list.h
+              ${PROJECT_SOURCE_DIR}/hqf/frame/pool.h
         DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}/hqf/frame)
 
 install(EXPORT hqfTargets NAMESPACE hqf:: DESTINATION ${package_dir})

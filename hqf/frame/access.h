@@ -31,10 +31,22 @@ object_type& object_or_spare(object_type* object) {
     return object != nullptr ? *object : spare;
 }
 
+/// Makes an object nil: an operation of the classes that can be.
+template<class model_class>
+using nil_setter = void (model_class::*)();
+
+/// The object that a child held by pointer lacks.
+template<class model_class>
+std::unique_ptr<model_class> missing_object(const pointer_member& member, nil_setter<model_class> make_nil) {
+    auto fresh = std::make_unique<model_class>();
+    if (member.nil) (*fresh.*make_nil)();
+    return fresh;
+}
+
 /// The object of a child held by pointer, made if it isn't there, and marked present.
 template<class model_class>
-model_class& made(child_pointer<model_class>& member) {
-    if (member.object == nullptr) member.object = new model_class;
+model_class& made(child_pointer<model_class>& member, nil_setter<model_class> make_nil = nullptr) {
+    if (member.object == nullptr) member.object = missing_object(member, make_nil).release();
     member.present = true;
     return *member.get();
 }
@@ -42,12 +54,13 @@ model_class& made(child_pointer<model_class>& member) {
 /// The same object for a caller that only looks: made if it isn't there, so that its address never changes, but not
 /// marked present. Two threads may look at one object at a time.
 template<class model_class>
-const model_class& made_to_look_at(const child_pointer<model_class>& member) {
+const model_class& made_to_look_at(const child_pointer<model_class>& member,
+                                   nil_setter<model_class> make_nil = nullptr) {
     // The pointer is the one thing that looking may change.
     const std::atomic_ref<void*> object(const_cast<void*&>(member.object));
     void* held = object.load(std::memory_order_acquire);
     if (held == nullptr) {
-        auto fresh = std::make_unique<model_class>();
+        auto fresh = missing_object(member, make_nil);
         if (object.compare_exchange_strong(held, fresh.get(), std::memory_order_acq_rel)) held = fresh.release();
     }
     return *static_cast<const model_class*>(held);

@@ -250,13 +250,10 @@ bool element_reader::read_child(const row& r) {
         if (!read_object(*r.type, &member_at<char>(object_, r.value))) return false;
         member_at<bool>(object_, r.flag) = true;
         return true;
-    case kind::child_pointer: {
-        void*& held = member_at<void*>(object_, r.value);
-        if (held == nullptr) held = r.type->create();
-        if (!read_object(*r.type, held)) return false;
+    case kind::child_pointer:
+        if (!read_object(*r.type, made_object(r))) return false;
         member_at<bool>(object_, r.flag) = true;
         return true;
-    }
     case kind::text_list:
     case kind::moment_list:
     case kind::child_list: return list_item(r);
@@ -270,6 +267,16 @@ bool element_reader::read_child(const row& r) {
     if (!simple_value(r, r.what, &member_at<char>(object_, r.value), stored)) return false;
     if (stored) member_at<bool>(object_, r.flag) = true;
     return true;
+}
+
+/// The object of a child held by pointer, made if need be.
+void* element_reader::made_object(const row& r) {
+    auto& held = member_at<pointer_member>(object_, r.value);
+    if (held.object == nullptr) {
+        held.object = r.type->create();
+        if (held.nil) member_at<bool>(held.object, r.type->nil) = true;
+    }
+    return held.object;
 }
 
 bool element_reader::read_single_group(const row& r) {
@@ -297,7 +304,7 @@ bool element_reader::list_item(const row& r) {
         if (!simple_value(r, what, &value, stored)) return false;
         if (!stored) return true;
         items.make_room();
-        items.append(new value_type(std::move(value)));
+        items.append(make_object<value_type>(value));
         return true;
     };
     return r.what == kind::text_list ? append(std::wstring(), kind::text) : append(lmx::c_datetime(), kind::moment);

@@ -62,6 +62,7 @@ private:
     bool child_of_row(row_cursor& at);
     bool read_child(const row& r);
     bool read_object(const class_rows& rows, void* object);
+    void* made_object(const row& r);
     bool read_single_group(const row& r);
     bool list_item(const row& r);
     bool simple_value(const row& r, kind what, void* value, bool& stored);

@@ -1,7 +1,5 @@
 /// The fast road: whole steps over the window. What a step has not read to its end it has not read at all.
 
-#include <memory>
-
 #include "hqf/frame/element_reader.h"
 #include "hqf/frame/objects.h"
 #include "hqf/frame/read_value.h"
@@ -169,13 +167,13 @@ bool element_reader::fast_text_item(window& in, const row& r) {
     auto& items = member_at<list_base>(object_, r.value);
     items.make_room();
     if (r.what == kind::text_list) {
-        auto item = std::make_unique<std::wstring>();
-        store_value(value, r.what, r.rules, item.get());
-        items.append(item.release());
+        auto* const item = make_object<std::wstring>();
+        items.append(item);
+        store_value(value, r.what, r.rules, item);
     } else {
         lmx::c_datetime moment;
         if (!store_value(value, r.what, r.rules, &moment)) return false;
-        items.append(new lmx::c_datetime(moment));
+        items.append(make_object<lmx::c_datetime>(moment));
     }
     remember_value(*r.name, whitespace_of(r.what, r.rules));
     return true;
@@ -196,7 +194,15 @@ bool element_reader::fast_object(window& in, const row& r) {
         items.append(object);
         return enter(start, *r.type, *r.name, object);
     }
-    if (object == nullptr) object = member_at<void*>(object_, r.value) = r.type->create();
+    if (object == nullptr) {
+        auto& held = member_at<pointer_member>(object_, r.value);
+        if (start.nil) {
+            remember(start, *r.type, *r.name);
+            return held.nil = held.present = true;
+        }
+        if (held.nil) return false;
+        object = held.object = r.type->create();
+    }
     if (!enter(start, *r.type, *r.name, object)) return false;
     member_at<bool>(object_, r.flag) = true;
     return true;

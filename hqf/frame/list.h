@@ -4,9 +4,40 @@
 
 #include <cstdlib>
 #include <new>
+#include <type_traits>
 #include <utility>
 
+#include "hqf/frame/pool.h"
+
 namespace hqf::frame {
+
+/// An object of a class that doesn't come from the pools by itself, such as a text.
+template<class value_type>
+struct pooled_value : pooled {
+    template<class... arguments>
+    explicit pooled_value(const arguments&... values)
+        : value(values...) {}
+
+    value_type value;
+};
+
+/// A new object from the pools. destroy_object() deletes it.
+template<class object_type, class... arguments>
+object_type* make_object(const arguments&... values) {
+    if constexpr (std::is_base_of_v<pooled, object_type>)
+        return new object_type(values...);
+    else
+        return &(new pooled_value<object_type>(values...))->value;
+}
+
+template<class object_type>
+void destroy_object(void* object) {
+    if constexpr (std::is_base_of_v<pooled, object_type>)
+        delete static_cast<object_type*>(object);
+    else
+        // The value is all that there is in it.
+        delete reinterpret_cast<pooled_value<object_type>*>(object);
+}
 
 /// The pointers of a list, without their type: the engine appends to every list through this.
 class list_base {
@@ -91,7 +122,7 @@ public:
     template<class... arguments>
     item_type& add(const arguments&... values) {
         make_room();
-        auto* object = new item_type(values...);
+        auto* object = make_object<item_type>(values...);
         append(object);
         return *object;
     }
@@ -100,7 +131,7 @@ public:
     template<class... arguments>
     void insert_new(unsigned int index, const arguments&... values) {
         make_room();
-        insert(index, new item_type(values...));
+        insert(index, make_object<item_type>(values...));
     }
 
     /// The item at `index`; default items fill the list up to there first.
@@ -118,12 +149,12 @@ public:
             add(value);
     }
 
-    void remove(unsigned int index) { delete static_cast<item_type*>(take(index)); }
+    void remove(unsigned int index) { destroy_object<item_type>(take(index)); }
 
     /// Destroys the items, from the last to the first.
     void clear() {
         while (size() != 0)
-            delete static_cast<item_type*>(take_back());
+            destroy_object<item_type>(take_back());
     }
 };
 

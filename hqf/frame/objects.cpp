@@ -2,6 +2,7 @@
 
 #include <cmath>
 #include <cstring>
+#include <memory>
 
 namespace hqf::frame {
 
@@ -64,6 +65,16 @@ bool flag_of(const row& r, const void* object) {
     return member_at<bool>(object, r.flag);
 }
 
+bool is_nil(const row& r, const pointer_member& member) {
+    return member.object == nullptr ? member.nil : r.type->is_nil(member.object);
+}
+
+/// What stands for a mandatory child that isn't there: in a copy its mandatory members count as set, like all others.
+void* copy_of_new(const class_rows& type) {
+    const std::unique_ptr<void, void (*)(void*)> fresh(type.create(), type.destroy);
+    return type.clone(fresh.get());
+}
+
 void copy_list(const row& r, void* to, const void* from) {
     auto& target = member_at<list_base>(to, r.value);
     const auto& source = member_at<list_base>(from, r.value);
@@ -79,16 +90,17 @@ void copy_row(const row& r, void* to, const void* from) {
         member_at<value_type>(to, r.value) = member_at<value_type>(from, r.value);
     });
     if (r.is_pointer()) {
-        const void* const source = member_at<void*>(from, r.value);
+        const auto& source = member_at<pointer_member>(from, r.value);
         void* copy = nullptr;
-        if (source != nullptr)
-            copy = r.type->clone(source);
-        else if (r.has(mandatory_row))
-            copy = r.type->create();
+        if (source.object != nullptr)
+            copy = r.type->clone(source.object);
+        else if (r.has(mandatory_row) && !source.nil)
+            copy = copy_of_new(*r.type);
         // A new document has its stamp already.
-        void*& target = member_at<void*>(to, r.value);
-        if (target != nullptr) r.type->destroy(target);
-        target = copy;
+        auto& target = member_at<pointer_member>(to, r.value);
+        if (target.object != nullptr) r.type->destroy(target.object);
+        target.object = copy;
+        target.nil = source.nil;
     } else if (!is_value) {
         copy_members(*r.type, &member_at<char>(to, r.value), &member_at<char>(from, r.value));
     }
@@ -101,9 +113,12 @@ void swap_row(const row& r, void* a, void* b) noexcept {
         using std::swap;
         swap(member_at<value_type>(a, r.value), member_at<value_type>(b, r.value));
     });
-    if (r.is_pointer())
-        std::swap(member_at<void*>(a, r.value), member_at<void*>(b, r.value));
-    else if (!is_value)
+    if (r.is_pointer()) {
+        auto& left = member_at<pointer_member>(a, r.value);
+        auto& right = member_at<pointer_member>(b, r.value);
+        std::swap(left.object, right.object);
+        std::swap(left.nil, right.nil);
+    } else if (!is_value)
         swap_members(*r.type, &member_at<char>(a, r.value), &member_at<char>(b, r.value));
     std::swap(flag_of(r, a), flag_of(r, b));
 }
@@ -126,9 +141,11 @@ bool equal_rows(const row& r, const void* a, const void* b) {
     });
     if (is_value) return equal;
     if (!r.is_pointer()) return equal_members(*r.type, &member_at<char>(a, r.value), &member_at<char>(b, r.value));
-    const void* left = member_at<void*>(a, r.value);
-    const void* right = member_at<void*>(b, r.value);
-    return left == nullptr || right == nullptr ? left == right : equal_members(*r.type, left, right);
+    const auto& left = member_at<pointer_member>(a, r.value);
+    const auto& right = member_at<pointer_member>(b, r.value);
+    if (is_nil(r, left) || is_nil(r, right)) return is_nil(r, left) == is_nil(r, right);
+    if (left.object == nullptr || right.object == nullptr) return left.object == right.object;
+    return equal_members(*r.type, left.object, right.object);
 }
 
 bool is_row_ok(const row& r, const void* object) {

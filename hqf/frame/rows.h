@@ -245,17 +245,13 @@ inline bool class_rows::is_nil(const void* object) const {
     return nil != 0 && member_at<bool>(object, nil);
 }
 
-template<class model_class>
+template<class object_type>
 void* create_object() {
-    return new model_class;
+    return make_object<object_type>();
 }
-template<class model_class>
+template<class object_type>
 void* clone_object(const void* object) {
-    return new model_class(*static_cast<const model_class*>(object));
-}
-template<class model_class>
-void destroy_object(void* object) {
-    delete static_cast<model_class*>(object);
+    return make_object<object_type>(*static_cast<const object_type*>(object));
 }
 
 } // namespace hqf::frame

@@ -51,10 +51,13 @@ struct pointer_member {
 
     void* object = nullptr;
     bool present = false;
+    /// Stands for the nil flag of an object that isn't there yet; the object that comes takes it over and is the truth
+    /// from then on.
+    bool nil = false;
 };
 
 /// A complex child on the heap, made when someone asks for it: the only way for a class to contain its own kind, and
-/// cheaper than an object for every child that might have been there.
+/// cheaper than an object for every child that might have been there. A nil child needs no object either.
 template<class model_class>
 struct child_pointer : pointer_member {
     ~child_pointer() { delete get(); }

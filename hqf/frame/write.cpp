@@ -35,6 +35,7 @@ private:
     lmx::c_xml_writer& writer() { return out_.writer(); }
 
     void start(const class_rows& rows, const tag& name);
+    void nil_end();
     void type_attribute(const class_rows& rows);
     void attribute(const row& r, const void* object);
     lmx::elmx_error choice(const class_rows& rows, void* object);
@@ -75,6 +76,13 @@ void element_writer::start(const class_rows& rows, const tag& name) {
     }
 }
 
+/// Ends the start tag of a nil element, and with it the element.
+void element_writer::nil_end() {
+    static constexpr char nil[] = " xsi:nil=\"true\"/>";
+    out_.text(nil, sizeof(nil) - 1);
+    out_.line_end();
+}
+
 void element_writer::type_attribute(const class_rows& rows) {
     const char* expected = writer().get_expected_class_identity();
     if (expected == nullptr || expected == *rows.id) return;
@@ -88,9 +96,7 @@ lmx::elmx_error element_writer::element(const class_rows& rows, void* object, co
     start(rows, name);
     if (rows.is_nil(object)) {
         if (rows.attributes_when_nil) attributes(rows, object);
-        static constexpr char nil[] = " xsi:nil=\"true\"/>";
-        out_.text(nil, sizeof(nil) - 1);
-        out_.line_end();
+        nil_end();
         return lmx::err_no_error;
     }
     if (rows.id != nullptr) type_attribute(rows);
@@ -180,9 +186,14 @@ lmx::elmx_error element_writer::child(const row& r, void* object) {
     case kind::group: return group(*r.type, member);
     case kind::child_pointer:
     case kind::group_pointer: {
-        void* held = member_at<void*>(object, r.value);
-        if (held == nullptr) return lmx::err_type_not_set;
-        return r.what == kind::group_pointer ? group(*r.type, held) : element(*r.type, held, tag(*r.name));
+        const auto& held = member_at<pointer_member>(object, r.value);
+        if (held.object != nullptr)
+            return r.what == kind::group_pointer ? group(*r.type, held.object)
+                                                 : element(*r.type, held.object, tag(*r.name));
+        if (!held.nil) return lmx::err_type_not_set;
+        start(*r.type, tag(*r.name));
+        nil_end();
+        return lmx::err_no_error;
     }
     default: break;
     }

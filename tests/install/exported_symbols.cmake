@@ -5,6 +5,7 @@ set(what "(vtable for |typeinfo for |typeinfo name for |VTT for |guard variable 
 set(names
   "hqf_v2::" # the model
   "lmx::" # the runtime
+  "hqf::frame::pooled(::|$)" # where the model's objects lie
   "hqf::equal\\(" # the one operation of our own on model classes
   "(CZip|ZipArchiveLib::)" # archives
   "Sys(AllocStringLen|AllocStringByteLen|FreeString|StringLen|StringByteLen)$" # strings for managed callers

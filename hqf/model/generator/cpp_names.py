@@ -82,10 +82,12 @@ def is_virtual(cls: ModelClass) -> bool:
     return cls.polymorphic
 
 
-def made_on_first_use(member: Member) -> bool:
+def made_on_first_use(vocabulary: Vocabulary, member: Member) -> bool:
     """Whether a single child lies on the heap: where it must, since its class can contain its own kind, and wherever it
-    may be absent, which most such children are in most documents."""
-    return member.by_pointer or (not member.minimum and not member.always_written)
+    may be absent, which most such children are in most documents; so are contents of elements that may be nil."""
+    if member.by_pointer or (not member.minimum and not member.always_written):
+        return True
+    return vocabulary.classes[member.class_name].nillable and not vocabulary.body(vocabulary.classes[member.class_name])
 
 
 def enumerations(cls: ModelClass) -> list[tuple[str, SimpleType]]:

@@ -141,7 +141,7 @@ class _Bodies:
             self.list_accessors(member)
         elif member.kind == "simple":
             self.value(member.name, f"{member.name}_", member.type, not member.minimum)
-        elif made_on_first_use(member):
+        elif made_on_first_use(self.vocabulary, member):
             self.pointer_accessors(member)
         else:
             self.child_accessors(member)
@@ -189,8 +189,10 @@ class _Bodies:
 
     def pointer_accessors(self, member: Member) -> None:
         name, item, stored = member.name, member.class_name, f"{member.name}_"
-        self.define(f"{item}&", f"get_{name}()", f"return frame::made({stored});")
-        self.define(f"const {item}&", f"get_{name}()", f"return frame::made_to_look_at({stored});", const=True)
+        make_nil = f", &{item}::setnil_{item}" if self.vocabulary.classes[item].nillable else ""
+        self.define(f"{item}&", f"get_{name}()", f"return frame::made({stored}{make_nil});")
+        self.define(f"const {item}&", f"get_{name}()", f"return frame::made_to_look_at({stored}{make_nil});",
+                    const=True)
         self.child_tail(member, stored)
 
     def child_tail(self, member: Member, stored: str) -> None:

@@ -43,7 +43,7 @@ class _Header:
         cls = self.cls
         self.class_body()
         includes = ["<string>"] + [f'"hqf/model/{name}.h"' for name in self.by_value()] + [
-            '"hqf/errors/elmx_error.h"', '"hqf/frame/storage.h"', '"hqf/platform/api.h"']
+            '"hqf/errors/elmx_error.h"', '"hqf/frame/pool.h"', '"hqf/frame/storage.h"', '"hqf/platform/api.h"']
         used = "\n".join(self.lines)
         if "lmx::c_datetime" in used:
             includes.append('"hqf/values/c_datetime.h"')
@@ -78,7 +78,7 @@ class _Header:
         if cls.doc:
             self.lines.append("///")
         self.doc(self.ownership(), "")
-        base = f" : public {cls.base}" if cls.base else ""
+        base = f" : public {cls.base or 'hqf::frame::pooled'}"
         self.lines += [f"class HQF_API {cls.name}{base} {{", "public:"]
         self.enumerations()
         self.life_cycle()
@@ -306,7 +306,7 @@ class _Header:
             self.add(f"bool isset_{name}() const;")
             self.doc("Clears the flag; the object stays.")
             self.add(f"void unset_{name}();")
-        kind = "child_pointer" if made_on_first_use(member) else "child"
+        kind = "child_pointer" if made_on_first_use(self.vocabulary, member) else "child"
         self.storage.append(f"hqf::frame::{kind}<{item}> {name}_;")
 
     def wildcard(self, member: Member) -> None:
