@@ -10,7 +10,16 @@ namespace hqf::frame {
 
 /// \returns 0, 37 below the minimum or for NaN where there is one, 36 above the maximum. `with_minimum` false leaves
 /// the minimum untested.
-lmx::elmx_error check_range(double value, const facets& rules, bool with_minimum);
+inline lmx::elmx_error check_range(double value, const facets& rules, bool with_minimum) {
+    // The comparisons are put so that NaN, which compares false with everything, fails the minimum and passes the
+    // maximum.
+    if (rules.has_minimum && with_minimum &&
+        !(rules.minimum_is_exclusive ? value > rules.minimum : value >= rules.minimum))
+        return lmx::err_value_less_than_specified_minimum;
+    if (rules.has_maximum && (rules.maximum_is_exclusive ? value >= rules.maximum : value > rules.maximum))
+        return lmx::err_value_greater_than_specified_maximum;
+    return lmx::err_no_error;
+}
 
 /// The checks of a setter, in this order: enumeration 38, minimum 37, maximum 36, minimum length 20, maximum length 19.
 /// Rules may be null.

@@ -18,8 +18,11 @@ constexpr std::size_t number_room = 48;
 
 bool parse_real(window& in, const facets* rules, char stop, parsed_value& value) {
     if (!in.room(number_room)) return false;
-    const char* const end = scan_double(in.p, in.edge(), value.real);
-    if (end == nullptr || end == in.edge() || *end != stop) return false;
+    const char* end = scan_short_decimal(in.p, value.real);
+    if (end == nullptr || *end != stop) {
+        end = scan_double(in.p, in.edge(), value.real);
+        if (end == nullptr || end == in.edge() || *end != stop) return false;
+    }
     if (rules != nullptr && check_range(value.real, *rules, true) != lmx::err_no_error) return false;
     in.p = end;
     return true;

@@ -90,12 +90,13 @@ protected:
 private:
     /// Most lists have one item: its pointer lies in the list itself, a longer list's in a block.
     static constexpr unsigned int in_place = 1;
+    static constexpr unsigned int least_block = 4;
 
     bool has_block() const { return capacity_ > in_place; }
     void** items() const { return has_block() ? static_cast<void**>(place_) : const_cast<void**>(&place_); }
 
     void grow() {
-        const unsigned int capacity = capacity_ * 2;
+        const unsigned int capacity = has_block() ? capacity_ * 2 : least_block;
         if (capacity <= capacity_) throw std::bad_alloc();
         void* const block = std::realloc(has_block() ? place_ : nullptr, sizeof(void*) * capacity);
         if (block == nullptr) throw std::bad_alloc();

@@ -102,15 +102,15 @@ enum class kind : std::uint8_t {
     boolean,
     moment, // lmx::c_datetime
     binary,
-    text_list,
-    moment_list,
-    any_list, // lmx::c_any_info
-    child,    // a class by value, in a row's `type`
+    child, // a class by value, in a row's `type`
     child_pointer,
-    child_list,
     group, // an sg_ class
     group_pointer,
-    group_list
+    group_list, // here the lists begin and the groups end
+    child_list,
+    text_list,
+    moment_list,
+    any_list // lmx::c_any_info
 };
 
 enum row_flag : std::uint8_t {
@@ -143,13 +143,8 @@ struct row {
     const class_rows* type;
 
     constexpr bool has(row_flag asked) const { return (flags & asked) != 0; }
-    constexpr bool is_list() const {
-        return what == kind::text_list || what == kind::moment_list || what == kind::any_list ||
-               what == kind::child_list || what == kind::group_list;
-    }
-    constexpr bool is_group() const {
-        return what == kind::group || what == kind::group_pointer || what == kind::group_list;
-    }
+    constexpr bool is_list() const { return what >= kind::group_list; }
+    constexpr bool is_group() const { return what >= kind::group && what <= kind::group_list; }
     constexpr bool is_pointer() const { return what == kind::child_pointer || what == kind::group_pointer; }
 };
 static_assert(sizeof(row) == 40);

@@ -6,6 +6,7 @@
 #include <cstdint>
 #include <cstring>
 
+#include "hqf/values/eight_digits.h"
 #include "hqf/values/scan.h"
 #include "hqf/values/transcode.h"
 
@@ -15,11 +16,31 @@ namespace {
 
 using lmx::is_digit;
 
-/// The places of the digits in the common form, "0000-00-00T00:00:00", and what stands between them.
+/// The places of the digits in the common form and what stands between them.
 constexpr char common_form[] = "0000-00-00T00:00:00";
 constexpr std::ptrdiff_t common_size = sizeof common_form - 1;
 
+/// Eight characters of the common form from a place, as differences() wants them.
+struct form_part {
+    std::uint64_t form = 0;
+    std::uint64_t slack = 0;
+
+    explicit constexpr form_part(int place) {
+        for (int i = 7; i >= 0; --i) {
+            form = form << 8 | static_cast<unsigned char>(common_form[place + i]);
+            slack = slack << 8 | (common_form[place + i] == '0' ? 0x76 : 0x7F);
+        }
+    }
+};
+
 bool has_common_form(const char* text) {
+    if constexpr (has_low_byte_first) {
+        constexpr int last_place = common_size - 8; // the parts overlap
+        constexpr form_part first(0), second(8), last(last_place);
+        return (differences(load_eight(text), first.form, first.slack) |
+                differences(load_eight(text + 8), second.form, second.slack) |
+                differences(load_eight(text + last_place), last.form, last.slack)) == 0;
+    }
     bool fits = true;
     for (std::ptrdiff_t i = 0; i < common_size; ++i)
         fits &= common_form[i] == '0' ? is_digit(text[i]) : text[i] == common_form[i];
@@ -74,8 +95,11 @@ bool read_zoned_datetime(const char* begin, const char* end, lmx::c_datetime& va
     if (end - begin <= common_size || !has_common_form(begin) || is_digit(begin[common_size])) return false;
 
     const char* cursor = begin + 17; // the seconds, whose fraction has no fixed length
-    float secs = 0;
-    lmx::scan_seconds(cursor, end, secs);
+    auto secs = static_cast<float>(two_digits(cursor));
+    if (begin[common_size] == '.')
+        lmx::scan_seconds(cursor, end, secs);
+    else
+        cursor = begin + common_size;
     std::int32_t offset = 0;
     const bool is_utc = end - cursor == 1 && *cursor == 'Z';
     if (!is_utc) {

@@ -3,6 +3,7 @@
 #include <charconv>
 #include <limits>
 
+#include "hqf/values/eight_digits.h"
 #include "hqf/values/lexical.h"
 #include "hqf/values/lexical_spans.h"
 #include "hqf/values/scan.h"
@@ -18,6 +19,7 @@ constexpr double exact_powers[] = {1e0,  1e1,  1e2,  1e3,  1e4,  1e5,  1e6,  1e7
                                    1e12, 1e13, 1e14, 1e15, 1e16, 1e17, 1e18, 1e19, 1e20, 1e21, 1e22};
 constexpr int largest_exact_power = 22;
 constexpr std::uint64_t exact_integers = std::uint64_t{1} << 53;
+constexpr std::uint64_t integer_powers[] = {1, 10, 100, 1000, 10000, 100000, 1000000, 10000000, 100000000};
 constexpr int safe_digits = 19; // any 19 digits fit 64 bits
 
 /// Beyond every exponent that matters, and far from the limits of the arithmetic with it.
@@ -173,6 +175,35 @@ const char* scan_double(const char* begin, const char* end, double& value) {
     }
     value = negative ? -magnitude : magnitude;
     return p;
+}
+
+const char* scan_short_decimal(const char* begin, double& value) {
+    if constexpr (!has_low_byte_first) return nullptr;
+    const bool negative = *begin == '-';
+    const char* const whole = begin + (negative ? 1 : 0);
+    std::uint64_t eight = load_eight(whole);
+    const unsigned int whole_digits = leading_digits(eight);
+    if (whole_digits == 0 || whole_digits == 8) return nullptr;
+    std::uint64_t mantissa = digits_value(eight, whole_digits);
+    const char* end = whole + whole_digits;
+    unsigned int fraction_digits = 0;
+    if (*end == '.') {
+        eight = load_eight(++end);
+        fraction_digits = leading_digits(eight);
+        if (fraction_digits == 0) return nullptr;
+        mantissa = mantissa * integer_powers[fraction_digits] + digits_value(eight, fraction_digits);
+        if (fraction_digits == 8) {
+            eight = load_eight(end + 8);
+            const unsigned int more = leading_digits(eight);
+            if (whole_digits + 8 + more > 15) return nullptr;
+            if (more != 0) mantissa = mantissa * integer_powers[more] + digits_value(eight, more);
+            fraction_digits += more;
+        }
+        end += fraction_digits;
+    }
+    const double magnitude = static_cast<double>(mantissa) / exact_powers[fraction_digits];
+    value = negative ? -magnitude : magnitude;
+    return end;
 }
 
 bool read_short_integer(const char* begin, const char* end, std::int64_t& value) {

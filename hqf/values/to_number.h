@@ -17,6 +17,10 @@ namespace hqf {
 /// \returns the end of the form; null, with nothing stored, where none begins
 const char* scan_double(const char* begin, const char* end, double& value);
 
+/// The same for the form that most numbers have: up to 15 digits with at most one point, which stands between digits.
+/// Null for any other; scan_double() decides then. Precondition: 32 bytes can be read.
+const char* scan_short_decimal(const char* begin, double& value);
+
 /// Whether the whole span is an integer form of at most 18 digits, which is when its value is stored. False says no
 /// more than that the long road must decide.
 bool read_short_integer(const char* begin, const char* end, std::int64_t& value);

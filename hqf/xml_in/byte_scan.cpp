@@ -23,14 +23,18 @@ __m128i load(const char* at) {
     return _mm_loadu_si128(reinterpret_cast<const __m128i*>(at));
 }
 
-// A bit for each of 16 bytes that is no plain ASCII.
-unsigned not_plain_mask(const char* at) {
+// All bits of each of 16 bytes that is no plain ASCII.
+__m128i not_plain(const char* at) {
     const __m128i bytes = load(at);
     // As signed numbers the bytes above ASCII are below the controls, so that one comparison finds both.
     const __m128i low = _mm_cmplt_epi8(bytes, _mm_set1_epi8(' '));
     const __m128i from_tab = _mm_sub_epi8(bytes, _mm_set1_epi8(9));
     const __m128i space = _mm_cmpeq_epi8(_mm_min_epu8(from_tab, _mm_set1_epi8(4)), from_tab);
-    return static_cast<unsigned>(_mm_movemask_epi8(_mm_andnot_si128(space, low)));
+    return _mm_andnot_si128(space, low);
+}
+
+unsigned mask_of(__m128i bytes) {
+    return static_cast<unsigned>(_mm_movemask_epi8(bytes));
 }
 
 unsigned text_end_mask(const char* at, char wanted) {
@@ -41,18 +45,27 @@ unsigned text_end_mask(const char* at, char wanted) {
     return static_cast<unsigned>(_mm_movemask_epi8(found));
 }
 
-// The line feeds in the whole 16-byte blocks of a run; `from` moves behind them.
-long long count_line_feeds_in_blocks(const char*& from, const char* stop) {
-    const __m128i line_feed = _mm_set1_epi8('\n');
+// The line feeds in the whole 64-byte blocks of a run, and whether there is a CR; `from` moves behind the blocks.
+long long count_line_feeds_in_blocks(const char*& from, const char* stop, bool& has_returns) {
+    __m128i returns = _mm_setzero_si128();
+    const auto at_line_feeds = [&returns](const char* at) {
+        const __m128i bytes = load(at);
+        returns = _mm_or_si128(returns, _mm_cmpeq_epi8(bytes, _mm_set1_epi8('\r')));
+        return _mm_cmpeq_epi8(bytes, _mm_set1_epi8('\n'));
+    };
     long long count = 0;
-    while (stop - from >= 16) {
-        // Each byte of the sum counts one column; 255 rows are as many as it can hold.
+    while (stop - from >= 64) {
+        // Each byte of the sum counts one column; 255 rows are as many as it can hold, and a block has four.
         __m128i columns = _mm_setzero_si128();
-        for (int row = 0; row < 255 && stop - from >= 16; ++row, from += 16)
-            columns = _mm_sub_epi8(columns, _mm_cmpeq_epi8(load(from), line_feed));
+        for (int block = 0; block < 63 && stop - from >= 64; ++block, from += 64) {
+            const __m128i first = _mm_add_epi8(at_line_feeds(from), at_line_feeds(from + 16));
+            const __m128i second = _mm_add_epi8(at_line_feeds(from + 32), at_line_feeds(from + 48));
+            columns = _mm_sub_epi8(columns, _mm_add_epi8(first, second));
+        }
         const __m128i sums = _mm_sad_epu8(columns, _mm_setzero_si128());
         count += _mm_cvtsi128_si64(sums) + _mm_cvtsi128_si64(_mm_srli_si128(sums, 8));
     }
+    has_returns = mask_of(returns) != 0;
     return count;
 }
 
@@ -60,8 +73,13 @@ long long count_line_feeds_in_blocks(const char*& from, const char* stop) {
 
 const char* skip_plain_ascii(const char* at, const char* stop) {
 #if defined(__SSE2__)
+    for (; stop - at >= 64; at += 64) {
+        const __m128i first = _mm_or_si128(not_plain(at), not_plain(at + 16));
+        const __m128i second = _mm_or_si128(not_plain(at + 32), not_plain(at + 48));
+        if (mask_of(_mm_or_si128(first, second)) != 0) break;
+    }
     for (; stop - at >= 16; at += 16)
-        if (const unsigned mask = not_plain_mask(at)) return at + std::countr_zero(mask);
+        if (const unsigned mask = mask_of(not_plain(at))) return at + std::countr_zero(mask);
 #endif
     while (at < stop && is_plain_ascii(static_cast<byte>(*at)))
         ++at;
@@ -101,27 +119,6 @@ const char* find_not_plain(const char* from, const char* stop) {
     }
 }
 
-const char* skip_space(const char* from, const char* stop) {
-    const char* at = from;
-#if defined(__SSE2__)
-    for (; at < stop; at += 16) {
-        const __m128i bytes = load(at);
-        // Bytes above ASCII are negative as signed numbers: no space either.
-        const auto above =
-            static_cast<unsigned>(_mm_movemask_epi8(_mm_or_si128(_mm_cmpgt_epi8(bytes, _mm_set1_epi8(' ')), bytes)));
-        if (above != 0) {
-            at += std::countr_zero(above);
-            break;
-        }
-    }
-    return at < stop ? at : stop;
-#else
-    while (at < stop && static_cast<byte>(*at) <= ' ')
-        ++at;
-    return at;
-#endif
-}
-
 const char* find_text_end(const char* from, const char* stop, char wanted) {
     const char* at = from;
 #if defined(__SSE2__)
@@ -143,13 +140,17 @@ long long count_line_ends(const char* from, const char* stop, unsigned char befo
     long long count = 0;
     if (from == stop) return count;
     const char* rest = from;
+    bool has_returns = false;
 #if defined(__SSE2__)
-    count = count_line_feeds_in_blocks(rest, stop);
+    count = count_line_feeds_in_blocks(rest, stop, has_returns);
 #endif
-    for (; rest != stop; ++rest)
+    for (; rest != stop; ++rest) {
         count += *rest == '\n' ? 1 : 0;
+        has_returns = has_returns || *rest == '\r';
+    }
     if (before == '\r' && *from == '\n') --count;
     // Few documents have a CR at all, so its cost is paid only where there is one.
+    if (!has_returns) return count;
     const auto* at = static_cast<const char*>(std::memchr(from, '\r', static_cast<std::size_t>(stop - from)));
     for (; at != nullptr && at != stop; ++at)
         if (*at == '\r' && !(at + 1 != stop && at[1] == '\n')) ++count;

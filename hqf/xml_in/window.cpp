@@ -95,6 +95,8 @@ void window::close() {
 
 bool window::prove_more() {
     if (end_ - edge_ <= margin) return false;
+    // While what was read still lies in the cache.
+    count_up_to(step_start_);
     const char* const stop = edge_ + std::min(chunk, end_ - edge_ - margin);
     const char* const proven = find_not_plain(edge_, stop);
     if (proven == edge_) return false;
