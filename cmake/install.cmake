@@ -12,7 +12,9 @@ foreach(root ${PROJECT_SOURCE_DIR}/hqf ${PROJECT_BINARY_DIR}/generated/hqf)
   install(DIRECTORY ${root} DESTINATION ${CMAKE_INSTALL_INCLUDEDIR} FILES_MATCHING PATTERN "*.h"
           PATTERN frame EXCLUDE
           PATTERN generator EXCLUDE
-          REGEX "/model/tables\\.h$" EXCLUDE)
+          REGEX "/model/tables\\.h$" EXCLUDE
+          # of the flat layer users see hqf_flat.h alone
+          REGEX "/flat/(additions|conventions|platform_strings)\\.h$" EXCLUDE)
 endforeach()
 install(FILES ${PROJECT_SOURCE_DIR}/hqf/frame/storage.h ${PROJECT_SOURCE_DIR}/hqf/frame/list.h
               ${PROJECT_SOURCE_DIR}/hqf/frame/pool.h

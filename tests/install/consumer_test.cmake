@@ -16,7 +16,7 @@ run(${CMAKE_COMMAND} --install ${BUILD_DIR} --prefix ${WORK_DIR}/installed)
 file(RENAME ${WORK_DIR}/installed ${prefix})
 
 foreach(name include/hqf/hqf.h include/hqf/model/Hqf.h ${LIBDIR}/libhqf.so ${LIBDIR}/libhqf.so.0
-        ${LIBDIR}/cmake/hqf/hqfConfig.cmake ${LIBDIR}/pkgconfig/hqf.pc share/hqf/hqf-v2.xsd)
+        include/hqf/flat/hqf_flat.h ${LIBDIR}/cmake/hqf/hqfConfig.cmake ${LIBDIR}/pkgconfig/hqf.pc share/hqf/hqf-v2.xsd)
   if(NOT EXISTS ${prefix}/${name})
     message(FATAL_ERROR "${name} is not installed")
   endif()
@@ -37,6 +37,10 @@ list(REMOVE_ITEM headers hqf/values/xml_regexp.h)
 list(TRANSFORM headers REPLACE "(.+)" "#include <\\1>")
 list(JOIN headers "\n" headers)
 file(WRITE ${WORK_DIR}/all_headers.cpp "${headers}\n")
+
+# One of them is for C.
+file(WRITE ${WORK_DIR}/flat.c "#include <hqf/flat/hqf_flat.h>\n")
+run(${COMPILER} -x c -std=c11 -pedantic -Wall -Wextra -Werror -fsyntax-only -I${prefix}/include ${WORK_DIR}/flat.c)
 
 run(${CMAKE_COMMAND} -S ${CONSUMER} -B ${WORK_DIR}/build -D CMAKE_PREFIX_PATH=${prefix}
     -D CMAKE_CXX_COMPILER=${COMPILER} "-DCMAKE_CXX_FLAGS=${FLAGS}" -D ALL_HEADERS=${WORK_DIR}/all_headers.cpp)

@@ -11,9 +11,13 @@ from pathlib import Path
 
 from cpp_names import NOTICE
 from emit_classes import class_bodies
+from emit_flat import flat_sources
+from emit_flat_header import flat_header
+from emit_flat_tests import name_list, null_arguments
 from emit_headers import class_header
 from emit_reference import reference_page
 from emit_tables import tables_header, tables_source
+from flat_exports import flat_exports
 from vocabulary import Vocabulary, load
 from xsd import SchemaError
 
@@ -28,6 +32,11 @@ def generate(vocabulary: Vocabulary) -> dict[str, str]:
     files["docs/vocabulary.md"] = reference_page(vocabulary)
     for part in dict.fromkeys(cls.part for cls in vocabulary.classes.values()):
         files[f"hqf/model/classes_{part}.cpp"] = class_bodies(vocabulary, part)
+    exports = flat_exports(vocabulary)
+    files |= flat_sources(exports)
+    files["hqf/flat/hqf_flat.h"] = flat_header(vocabulary, exports)
+    files["tests/flat/exports.txt"] = name_list(exports)
+    files["tests/flat/null_arguments.inc"] = null_arguments(exports)
     return files
 
 
