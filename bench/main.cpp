@@ -64,6 +64,7 @@ int run(int argc, char** argv) {
         }
     }
     if (!folder.empty()) return 0;
+    add_flat_calls();
     benchmark::Initialize(&argc, argv);
     if (benchmark::ReportUnrecognizedArguments(argc, argv)) return 2;
     benchmark::RunSpecifiedBenchmarks();

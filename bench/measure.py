@@ -40,8 +40,8 @@ class Row:
         for run in raw["benchmarks"]:
             if run.get("error_occurred"):
                 sys.exit(f"{run['name']}: {run['error_message']}")
-            if run["run_type"] != "iteration":
-                continue
+            if run["run_type"] != "iteration" or "document_bytes" not in run:
+                continue  # single calls have no document
             task, kind, size, peer = run["run_name"].split("/")[:4]
             row = rows.setdefault(f"{task}/{kind}/{size}/{peer}",
                                   Row(task, kind, size, peer, run["label"], int(run["document_bytes"]), []))

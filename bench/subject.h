@@ -72,5 +72,6 @@ void add_pugixml_load(const subject& document);
 void add_pugixml_write(const subject& document);
 void add_hqf_archive(const subject& document);
 void add_zlib_archive(const subject& document);
+void add_flat_calls(); ///< not about a document: their rows have no size
 
 } // namespace hqf_bench

@@ -11,6 +11,7 @@ from pathlib import Path
 
 from cpp_names import NOTICE
 from emit_classes import class_bodies
+from emit_csharp import csharp_sources
 from emit_flat import flat_sources
 from emit_flat_header import flat_header
 from emit_flat_tests import name_list, null_arguments
@@ -37,6 +38,7 @@ def generate(vocabulary: Vocabulary) -> dict[str, str]:
     files["hqf/flat/hqf_flat.h"] = flat_header(vocabulary, exports)
     files["tests/flat/exports.txt"] = name_list(exports)
     files["tests/flat/null_arguments.inc"] = null_arguments(exports)
+    files |= csharp_sources(vocabulary, exports)
     return files
 
 
