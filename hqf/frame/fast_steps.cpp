@@ -230,7 +230,8 @@ const char* parse_start(window& in, const char* at, const class_rows& rows, cons
     }
     if (rows.attribute_count != 0) {
         at = parse_attributes(in, at, rows, object, start);
-        if (at == nullptr || !has_mandatory_attributes(rows, object, start)) return nullptr;
+        if (at == nullptr || (rows.needed_attributes != 0 && !has_mandatory_attributes(rows, object, start)))
+            return nullptr;
     }
     if (!in.room(at, 1) || *at != '>') return nullptr;
     ++at;
