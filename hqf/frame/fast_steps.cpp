@@ -179,6 +179,7 @@ const char* parse_value(window& in, const char* at, kind what, const facets* rul
     case kind::natural:
     case kind::octet: return parse_whole(in, at, rules, stop, value);
     case kind::text:
+    case kind::enumerated:
     case kind::text_list: return parse_text(in, at, rules, stop, value);
     case kind::moment:
     case kind::moment_list: return take_text(in, at, stop, value);
@@ -199,6 +200,7 @@ bool store_value(const parsed_value& value, kind what, const facets* rules, void
         return true;
     }
     switch (what) {
+    case kind::enumerated: static_cast<enumerated*>(member)->set_number(value.literal); break;
     case kind::integer: *static_cast<int*>(member) = static_cast<int>(value.whole); break;
     case kind::natural: *static_cast<unsigned int*>(member) = static_cast<unsigned int>(value.whole); break;
     case kind::octet: *static_cast<unsigned char*>(member) = static_cast<unsigned char>(value.whole); break;

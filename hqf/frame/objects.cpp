@@ -28,6 +28,7 @@ template<class action>
 bool with_value_type(kind what, action&& act) {
     switch (what) {
     case kind::text: act(static_cast<std::wstring*>(nullptr)); return true;
+    case kind::enumerated: act(static_cast<enumerated*>(nullptr)); return true;
     case kind::real: act(static_cast<double*>(nullptr)); return true;
     case kind::integer: act(static_cast<int*>(nullptr)); return true;
     case kind::natural: act(static_cast<unsigned int*>(nullptr)); return true;

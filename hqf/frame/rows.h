@@ -94,7 +94,8 @@ struct facets {
 
 /// How a member is stored and what it holds.
 enum class kind : std::uint8_t {
-    text, // std::wstring; an enumerated one has facets with literals
+    text,
+    enumerated, // its facets have the literals
     real,
     integer,
     natural,
