@@ -65,12 +65,22 @@ void element_reader::remember(const parsed_start& start, const class_rows& rows,
 
 bool element_reader::fast_end_tag() {
     const auto [in, at] = tag_place(reader_);
-    if (at == nullptr || at[1] != '/') return false;
-    const std::string_view name = name_->get_str();
-    if (!in->room(at, name.size() + 3) || std::memcmp(at + 2, name.data(), name.size()) != 0 ||
-        at[2 + name.size()] != '>')
-        return false;
-    in->p = at + name.size() + 3;
+    return at != nullptr && at[1] == '/' && fast_end_tag(*in, at);
+}
+
+/// With "</" at the place.
+bool element_reader::fast_end_tag(window& in, const char* at) {
+    if (fast_name_ != nullptr) {
+        at = close_tag(in, at, *fast_name_);
+        if (at == nullptr) return false;
+        in.p = at;
+    } else {
+        const std::string_view name = name_->get_str();
+        if (!in.room(at, name.size() + 3) || std::memcmp(at + 2, name.data(), name.size()) != 0 ||
+            at[2 + name.size()] != '>')
+            return false;
+        in.p = at + name.size() + 3;
+    }
     reader_.restore_event(lmx::EXE_ELEMENT_END);
     return true;
 }
@@ -80,7 +90,7 @@ bool element_reader::enter(const parsed_start& start, const class_rows& rows, co
     remember(start, rows, name);
     store_start(start, rows, object);
     if (start.complete) return true;
-    error_ = element_reader(rows, object, reader_).entered(qualified_name(name));
+    error_ = element_reader(rows, object, reader_).entered(name);
     return error_ == lmx::err_no_error;
 }
 
@@ -93,10 +103,7 @@ void element_reader::fast_children(row_cursor& at) {
         if (tag[1] == '/') {
             // An element with no content at all is accepted here if its class is tolerant; else the general road
             // reports.
-            if (!begun_)
-                is_over_ = rows_.tolerant && fast_end_tag();
-            else if (is_rest_optional(at))
-                at.row = rows_.row_count;
+            if (begun_ ? is_end_due(at) : rows_.tolerant) is_over_ = fast_end_tag(*in, tag);
             return;
         }
         int member = -1;
@@ -111,13 +118,13 @@ void element_reader::fast_children(row_cursor& at) {
     }
 }
 
-/// Whether the rows from the cursor on are satisfied with what has been read.
-bool element_reader::is_rest_optional(row_cursor at) const {
+/// Whether the rows from the cursor on are satisfied with what has been read, and nothing is looked at once more.
+bool element_reader::is_end_due(row_cursor at) const {
     for (; at.row < rows_.row_count; at.next_row()) {
         const row& r = rows_.rows[at.row];
         if (r.has(mandatory_row) && !at.seen) return false;
     }
-    return true;
+    return !rows_.minimums_at_end || is_occurs_ok(rows_, object_);
 }
 
 /// The row that the start tag here belongs to, with the cursor moved to it; null where the general road must decide.
@@ -249,7 +256,7 @@ bool element_reader::fast_head(window& in, const char* at, const row& r) {
     in.p = at;
     fast_trace& trace = reader_access::trace(reader_);
     trace = {"xsi:type", fast_trace::name_kind::xsi, true, lmx::preserve};
-    error_ = element_reader(rows, made, reader_).entered(qualified_name(name));
+    error_ = element_reader(rows, made, reader_).entered(name);
     if (error_ != lmx::err_no_error) return false;
     if (r.what != kind::group_list) member_at<bool>(object_, r.flag) = true;
     return true;
