@@ -43,9 +43,18 @@ lmx::elmx_error store(value_member<value_type>& member, const value_type& value,
     return lmx::err_no_error;
 }
 
+/// The same for an enumerated text, whose rules are its literals.
+inline lmx::elmx_error store(value_member<enumerated>& member, const std::wstring& value, const facets* rules) {
+    const lmx::elmx_error error = check_value(value, rules);
+    if (error != lmx::err_no_error) return error;
+    member.value.set_text(value, *rules->texts);
+    member.set = true;
+    return lmx::err_no_error;
+}
+
 /// The same for the body of a class that can be nil: a value ends that.
-template<class value_type>
-lmx::elmx_error store(value_member<value_type>& member, bool& nil, const value_type& value,
+template<class member_type, class value_type>
+lmx::elmx_error store(value_member<member_type>& member, bool& nil, const value_type& value,
                       const facets* rules = nullptr) {
     const lmx::elmx_error error = store(member, value, rules);
     if (error == lmx::err_no_error) nil = false;

@@ -54,10 +54,11 @@ lmx::elmx_error element_reader::element(std::string_view name) {
     return error_;
 }
 
-lmx::elmx_error element_reader::entered(std::string_view name) {
+lmx::elmx_error element_reader::entered(const element_name& name) {
     const depth_count depth(reader_);
-    const lmx::c_string_stack_node node(reader_.get_element_name_stack(), name);
+    const lmx::c_string_stack_node node(reader_.get_element_name_stack(), {name.open + 1, name.length - 2u});
     name_ = &node;
+    fast_name_ = &name;
     const lmx::c_xml_reader_local scope(&reader_);
     if (body() && !is_over_) end_tag();
     return error_;

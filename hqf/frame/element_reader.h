@@ -35,7 +35,7 @@ public:
     /// Reads the element whose start tag has been read up to its name.
     lmx::elmx_error element(std::string_view name);
     /// Reads the content of an element whose start tag a fast step has read and stored.
-    lmx::elmx_error entered(std::string_view name);
+    lmx::elmx_error entered(const element_name& name);
 
     // Pieces of element(), for classes of the application that put them together themselves. Those with a body start
     // from the reader's current event and leave it at the first thing that they don't take.
@@ -73,15 +73,16 @@ private:
 
     // Steps over the window.
     bool fast_end_tag();
+    bool fast_end_tag(window& in, const char* at);
+    bool is_end_due(row_cursor at) const;
     void fast_children(row_cursor& at);
-    bool is_rest_optional(row_cursor at) const;
-    const row* find_row(const window& in, row_cursor& at, int& member) const;
-    bool fast_child(window& in, const row& r, int member);
-    bool fast_simple(window& in, const row& r);
-    bool fast_text_item(window& in, const row& r);
-    bool fast_object(window& in, const row& r);
-    bool fast_member(window& in, const row& r, int member);
-    bool fast_head(window& in, const row& r);
+    const row* find_row(const char* tag, row_cursor& at, int& member) const;
+    bool fast_child(window& in, const char* at, const row& r, int member);
+    bool fast_simple(window& in, const char* at, const row& r);
+    bool fast_text_item(window& in, const char* at, const row& r);
+    bool fast_object(window& in, const char* at, const row& r);
+    bool fast_member(window& in, const char* at, const row& r, int member);
+    bool fast_head(window& in, const char* at, const row& r);
     void* group_to_fill(const row& r);
     bool fast_option();
     bool is_too_deep() const;
@@ -95,6 +96,8 @@ private:
     lmx::elmx_error error_ = lmx::err_no_error;
     /// The element's name on the reader's stack; null while only a piece of an element is read.
     const lmx::c_string_stack_node* name_ = nullptr;
+    /// The same name, if a fast step read it.
+    const element_name* fast_name_ = nullptr;
     /// The reader's current event is about what comes next; otherwise nothing of that has been read.
     bool in_hand_ = false;
     /// Something of the content has been read.

@@ -16,24 +16,21 @@ namespace {
 /// The longest text of a number in its short form, and some more.
 constexpr std::size_t number_room = 48;
 
-bool parse_real(window& in, const facets* rules, char stop, parsed_value& value) {
-    if (!in.room(number_room)) return false;
-    const char* end = scan_short_decimal(in.p, value.real);
+const char* parse_real(window& in, const char* at, const facets* rules, char stop, double& value) {
+    if (!in.room(at, number_room)) return nullptr;
+    const char* end = scan_short_decimal(at, value);
     if (end == nullptr || *end != stop) {
-        end = scan_double(in.p, in.edge(), value.real);
-        if (end == nullptr || end == in.edge() || *end != stop) return false;
+        end = scan_double(at, in.edge(), value);
+        if (end == nullptr || end == in.edge() || *end != stop) return nullptr;
     }
-    if (rules != nullptr && check_range(value.real, *rules, true) != lmx::err_no_error) return false;
-    in.p = end;
-    return true;
+    return rules == nullptr || check_range(value, *rules, true) == lmx::err_no_error ? end : nullptr;
 }
 
-bool take_text(window& in, char stop, parsed_value& value) {
-    std::string_view text;
-    if (!in.text(stop, text)) return false;
-    value.begin = text.data();
-    value.size = text.size();
-    return true;
+const char* take_text(window& in, const char* at, char stop, parsed_value& value) {
+    const char* const end = in.find(at, stop);
+    value.begin = at;
+    value.size = static_cast<std::size_t>(end - at);
+    return end;
 }
 
 /// The entities that a text of our own writer refers to (XML 1.0, 4.6).
@@ -52,20 +49,22 @@ char predefined_character(const char* text, std::size_t& length) {
 }
 
 /// Text with references to predefined entities up to `stop`.
-bool take_text_with_references(window& in, char stop, parsed_value& value) {
-    const char* const start = in.p;
-    std::string_view run;
-    std::size_t length = 0;
-    while (!in.text(stop, run)) {
+const char* take_text_with_references(window& in, const char* at, char stop, parsed_value& value) {
+    const char* end = at;
+    for (const char* run = at; (end = in.find(run, stop)) == nullptr;) {
         // Text before the reference, then the reference itself.
-        if (!in.text('&', run) || !in.room(longest_name_room) || predefined_character(in.p, length) == 0) return false;
-        if (std::memchr(run.data(), stop, run.size()) != nullptr) return false;
-        in.p += length;
+        const char* const reference = in.find(run, '&');
+        std::size_t length = 0;
+        if (reference == nullptr || !in.room(reference, longest_name_room) ||
+            predefined_character(reference, length) == 0 ||
+            std::memchr(run, stop, static_cast<std::size_t>(reference - run)) != nullptr)
+            return nullptr;
+        run = reference + length;
     }
-    value.begin = start;
-    value.size = static_cast<std::size_t>(in.p - start);
+    value.begin = at;
+    value.size = static_cast<std::size_t>(end - at);
     value.has_references = true;
-    return true;
+    return end;
 }
 
 void assign_text(std::wstring& out, const parsed_value& value) {
@@ -83,10 +82,12 @@ void assign_text(std::wstring& out, const parsed_value& value) {
     append_wide(out, at, static_cast<std::size_t>(value.end() - at));
 }
 
-bool parse_whole(window& in, const facets* rules, char stop, parsed_value& value) {
-    if (!take_text(in, stop, value) || !read_short_integer(value.begin, value.end(), value.whole)) return false;
+const char* parse_whole(window& in, const char* at, const facets* rules, char stop, parsed_value& value) {
+    const char* const end = take_text(in, at, stop, value);
+    if (end == nullptr || !read_short_integer(at, end, value.whole)) return nullptr;
     // Every integer type has bounds within 32 bits, so a double compares them exactly.
-    return rules != nullptr && check_range(static_cast<double>(value.whole), *rules, true) == lmx::err_no_error;
+    const auto number = static_cast<double>(value.whole);
+    return rules != nullptr && check_range(number, *rules, true) == lmx::err_no_error ? end : nullptr;
 }
 
 /// Text that collapsing would change is left to the general road.
@@ -99,26 +100,25 @@ bool is_collapsed(const parsed_value& value) {
     return value.size == 0 || before != ' ';
 }
 
-bool parse_text(window& in, const facets* rules, char stop, parsed_value& value) {
-    value.literal = 0;
-    value.has_references = false;
-    const char* const mark = in.mark();
-    if (!take_text(in, stop, value)) {
-        in.back(mark);
-        // Only where no rule looks at the text.
-        return rules == nullptr && take_text_with_references(in, stop, value);
-    }
-    if (rules == nullptr) return true;
-    if (rules->texts != nullptr) {
-        value.literal = rules->texts->number_of(value.begin, value.size);
+bool fulfils(parsed_value& value, const facets& rules) {
+    if (rules.texts != nullptr) {
+        value.literal = rules.texts->number_of(value.begin, value.size);
         return value.literal != 0;
     }
-    if (rules->whitespace == lmx::collapse && !is_collapsed(value)) return false;
-    if (rules->minimum_length >= 0 &&
-        !has_min_length(value.begin, value.end(), static_cast<unsigned int>(rules->minimum_length)))
+    if (rules.whitespace == lmx::collapse && !is_collapsed(value)) return false;
+    if (rules.minimum_length >= 0 &&
+        !has_min_length(value.begin, value.end(), static_cast<unsigned int>(rules.minimum_length)))
         return false;
-    return rules->maximum_length < 0 ||
-           has_max_length(value.begin, value.end(), static_cast<unsigned int>(rules->maximum_length));
+    return rules.maximum_length < 0 ||
+           has_max_length(value.begin, value.end(), static_cast<unsigned int>(rules.maximum_length));
+}
+
+const char* parse_text(window& in, const char* at, const facets* rules, char stop, parsed_value& value) {
+    value.literal = 0;
+    value.has_references = false;
+    const char* const end = take_text(in, at, stop, value);
+    if (rules == nullptr) return end != nullptr ? end : take_text_with_references(in, at, stop, value);
+    return end != nullptr && fulfils(value, *rules) ? end : nullptr;
 }
 
 bool is_set(const row& r, const void* object) {
@@ -131,20 +131,21 @@ bool is_storable(const parsed_value& value, const row& r) {
     return r.what != kind::moment || read_zoned_datetime(value.begin, value.end(), moment);
 }
 
-bool parse_attributes(window& in, const class_rows& rows, const void* object, parsed_start& start) {
+const char* parse_attributes(window& in, const char* at, const class_rows& rows, const void* object,
+                             parsed_start& start) {
     const row* next = rows.attributes;
     const row* const end = rows.attributes + rows.attribute_count;
-    while (in.room(longest_name_room) && *in.p == ' ') {
-        while (next != end && !same_text(in.p, next->attribute->open, next->attribute->length))
+    while (in.room(at, longest_name_room) && *at == ' ') {
+        while (next != end && !same_text(at, next->attribute->open, next->attribute->length))
             ++next;
-        if (next == end || start.count == parsed_start::most_attributes || is_set(*next, object)) return false;
-        in.p += next->attribute->length;
+        if (next == end || start.count == parsed_start::most_attributes || is_set(*next, object)) return nullptr;
         parsed_value& value = start.values[start.count];
-        if (!parse_value(in, next->what, next->rules, '"', value) || !is_storable(value, *next)) return false;
-        ++in.p;
+        at = parse_value(in, at + next->attribute->length, next->what, next->rules, '"', value);
+        if (at == nullptr || !is_storable(value, *next)) return nullptr;
+        ++at;
         start.attributes[start.count++] = next++;
     }
-    return true;
+    return at;
 }
 
 /// Whether every mandatory attribute is there, now or from before.
@@ -161,37 +162,45 @@ bool has_mandatory_attributes(const class_rows& rows, const void* object, const 
 }
 
 /// In the words of our own writer alone.
-bool parse_nil(window& in) {
+const char* parse_nil(window& in, const char* at) {
     static constexpr char text[33] = " xsi:nil=\"true\"/>";
     constexpr std::size_t size = 17;
-    if (!in.room(size) || !same_text(in.p, text, size)) return false;
-    in.p += size;
-    return true;
+    return in.room(at, size) && same_text(at, text, size) ? at + size : nullptr;
 }
 
 } // namespace
 
-bool parse_value(window& in, kind what, const facets* rules, char stop, parsed_value& value) {
+const char* parse_value(window& in, const char* at, kind what, const facets* rules, char stop, parsed_value& value) {
+    // Most values of a large document are numbers.
+    if (what == kind::real) return parse_real(in, at, rules, stop, value.real);
+    const char* end = nullptr;
     switch (what) {
-    case kind::real: return parse_real(in, rules, stop, value);
     case kind::integer:
     case kind::natural:
-    case kind::octet: return parse_whole(in, rules, stop, value);
+    case kind::octet: return parse_whole(in, at, rules, stop, value);
     case kind::text:
-    case kind::text_list: return parse_text(in, rules, stop, value);
-    case kind::boolean: return take_text(in, stop, value) && read_bool(value.begin, value.end(), value.truth);
+    case kind::enumerated:
+    case kind::text_list: return parse_text(in, at, rules, stop, value);
     case kind::moment:
-    case kind::moment_list: return take_text(in, stop, value);
+    case kind::moment_list: return take_text(in, at, stop, value);
+    case kind::boolean:
+        end = take_text(in, at, stop, value);
+        return end != nullptr && read_bool(at, end, value.truth) ? end : nullptr;
     case kind::binary:
-        return take_text(in, stop, value) && is_collapsed(value) &&
-               lmx::c_binary::is_valid_base64(std::string(value.begin, value.size));
-    default: return false;
+        end = take_text(in, at, stop, value);
+        return end != nullptr && is_collapsed(value) && lmx::c_binary::is_valid_base64(std::string(at, end)) ? end
+                                                                                                             : nullptr;
+    default: return nullptr;
     }
 }
 
 bool store_value(const parsed_value& value, kind what, const facets* rules, void* member) {
+    if (what == kind::real) {
+        *static_cast<double*>(member) = value.real;
+        return true;
+    }
     switch (what) {
-    case kind::real: *static_cast<double*>(member) = value.real; break;
+    case kind::enumerated: static_cast<enumerated*>(member)->set_number(value.literal); break;
     case kind::integer: *static_cast<int*>(member) = static_cast<int>(value.whole); break;
     case kind::natural: *static_cast<unsigned int*>(member) = static_cast<unsigned int>(value.whole); break;
     case kind::octet: *static_cast<unsigned char*>(member) = static_cast<unsigned char>(value.whole); break;
@@ -210,22 +219,28 @@ bool store_value(const parsed_value& value, kind what, const facets* rules, void
     return true;
 }
 
-bool parse_start(window& in, const class_rows& rows, const element_name& name, const void* object,
-                 parsed_start& start) {
-    in.p += name.length - 1;
-    if (rows.nil != 0 && parse_nil(in)) {
-        start.nil = start.complete = true;
-        return has_mandatory_attributes(rows, object, start);
+const char* parse_start(window& in, const char* at, const class_rows& rows, const element_name& name,
+                        const void* object, parsed_start& start) {
+    at += name.length - 1;
+    if (rows.nil != 0) {
+        if (const char* const end = parse_nil(in, at)) {
+            start.nil = start.complete = true;
+            return has_mandatory_attributes(rows, object, start) ? end : nullptr;
+        }
+        // An object that is nil from before would not read its content.
+        if (object != nullptr && rows.is_nil(object)) return nullptr;
     }
-    // An object that is nil from before would not read its content.
-    if (!parse_attributes(in, rows, object, start) || !in.room(1) || *in.p != '>' ||
-        (object != nullptr && rows.is_nil(object)) || !has_mandatory_attributes(rows, object, start))
-        return false;
-    ++in.p;
-    if (rows.shape != form::simple_content) return true;
+    if (rows.attribute_count != 0) {
+        at = parse_attributes(in, at, rows, object, start);
+        if (at == nullptr || (rows.needed_attributes != 0 && !has_mandatory_attributes(rows, object, start)))
+            return nullptr;
+    }
+    if (!in.room(at, 1) || *at != '>') return nullptr;
+    ++at;
+    if (rows.shape != form::simple_content) return at;
     start.complete = true;
     const row& body = *rows.rows;
-    return parse_value(in, body.what, body.rules, '<', start.body) && close_tag(in, name);
+    return parse_content(in, at, body.what, body.rules, name, start.body);
 }
 
 void store_start(const parsed_start& start, const class_rows& rows, void* object) {
@@ -243,19 +258,20 @@ void store_start(const parsed_start& start, const class_rows& rows, void* object
     }
 }
 
-bool parse_type_attribute(window& in, std::string_view& name) {
+const char* parse_type_attribute(window& in, const char* at, std::string_view& name) {
     static constexpr char text[17] = " xsi:type=\"Hqf:";
     constexpr std::size_t size = 15;
-    if (!in.room(longest_name_room) || !same_text(in.p, text, size)) return false;
-    in.p += size;
-    if (!in.text('"', name) || !in.room(2) || in.p[1] != '>') return false;
-    in.p += 2;
-    return true;
+    if (!in.room(at, longest_name_room) || !same_text(at, text, size)) return nullptr;
+    const char* const begin = at + size;
+    const char* const end = in.find(begin, '"');
+    if (end == nullptr || !in.room(end, 2) || end[1] != '>') return nullptr;
+    name = {begin, static_cast<std::size_t>(end - begin)};
+    return end + 2;
 }
 
-int find_member(const window& in, const class_rows& group) {
+int find_member(const char* at, const class_rows& group) {
     for (int i = 0; i < group.member_count; ++i)
-        if (starts(in, *group.members[i].name)) return i;
+        if (starts(at, *group.members[i].name)) return i;
     return -1;
 }
 

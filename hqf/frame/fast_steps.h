@@ -1,6 +1,6 @@
-/// Steps over the window: a value, a tag, the start of an element. Each reads what stands at the window's position in
-/// the spelling of our own writer and leaves the position behind it, or gives false: then the caller goes back to its
-/// mark, nothing has been stored, and the general road reads the same bytes.
+/// Looks over the window: a value, a tag, the start of an element. Each takes a place where something stands in the
+/// spelling of our own writer and gives the place behind it, or null: then nothing has been stored, the window's
+/// position hasn't moved, and the general road reads the same bytes.
 #pragma once
 
 #include <cstdint>
@@ -57,22 +57,28 @@ inline bool same_text(const char* text, const char* constant, std::size_t size) 
 inline constexpr std::size_t longest_name_room = 96;
 
 /// Whether the start tag "<Hqf:Name" stands here, followed by its end or by attributes.
-inline bool starts(const window& in, const element_name& name) {
+inline bool starts(const char* at, const element_name& name) {
     const std::size_t size = name.length - 1u;
-    return same_text(in.p, name.open, size) && (in.p[size] == '>' || in.p[size] == ' ');
+    return same_text(at, name.open, size) && (at[size] == '>' || at[size] == ' ');
 }
 
-/// Moves over "</Hqf:Name>".
-inline bool close_tag(window& in, const element_name& name) {
-    if (!in.room(longest_name_room) || in.p[0] != '<' || in.p[1] != '/' ||
-        !same_text(in.p + 2, name.open + 1, name.length - 1u))
-        return false;
-    in.p += name.length + 1;
-    return true;
+/// Behind "</Hqf:Name>".
+inline const char* close_tag(window& in, const char* at, const element_name& name) {
+    const bool is_here = in.room(at, longest_name_room) && at[0] == '<' && at[1] == '/' &&
+                         same_text(at + 2, name.open + 1, name.length - 1u);
+    return is_here ? at + name.length + 1 : nullptr;
 }
 
-/// A value up to `stop` that passes every check of its rules; a date and time is checked when it is stored.
-bool parse_value(window& in, kind what, const facets* rules, char stop, parsed_value& value);
+/// A value up to `stop` that passes every check of its rules; a date and time is checked when it is stored. Gives the
+/// place of `stop`.
+const char* parse_value(window& in, const char* at, kind what, const facets* rules, char stop, parsed_value& value);
+
+/// A value and the end tag behind it.
+inline const char* parse_content(window& in, const char* at, kind what, const facets* rules, const element_name& name,
+                                 parsed_value& value) {
+    at = parse_value(in, at, what, rules, '<', value);
+    return at == nullptr ? nullptr : close_tag(in, at, name);
+}
 
 /// Stores a parsed value in a member of that kind; false, with nothing stored, for a date and time that is not in its
 /// common form.
@@ -92,15 +98,16 @@ struct parsed_start {
 };
 
 /// \param object the object that the element will be read into, null for one that is yet to be made
-bool parse_start(window& in, const class_rows& rows, const element_name& name, const void* object, parsed_start& start);
+const char* parse_start(window& in, const char* at, const class_rows& rows, const element_name& name,
+                        const void* object, parsed_start& start);
 
 /// Stores attributes, the nil flag and the body in the object.
 void store_start(const parsed_start& start, const class_rows& rows, void* object);
 
-/// Moves over ` xsi:type="Hqf:Name">` and gives the name.
-bool parse_type_attribute(window& in, std::string_view& name);
+/// Behind ` xsi:type="Hqf:Name">`, of which it gives the name.
+const char* parse_type_attribute(window& in, const char* at, std::string_view& name);
 
 /// The member of a group whose start tag stands here, -1 for none.
-int find_member(const window& in, const class_rows& group);
+int find_member(const char* at, const class_rows& group);
 
 } // namespace hqf::frame

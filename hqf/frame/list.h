@@ -2,7 +2,7 @@
 /// address stays the same while the list grows.
 #pragma once
 
-#include <cstdlib>
+#include <cstring>
 #include <new>
 #include <type_traits>
 #include <utility>
@@ -84,7 +84,7 @@ public:
 
 protected:
     ~list_base() {
-        if (has_block()) std::free(place_);
+        if (has_block()) pooled::operator delete(place_);
     }
 
 private:
@@ -98,9 +98,9 @@ private:
     void grow() {
         const unsigned int capacity = has_block() ? capacity_ * 2 : least_block;
         if (capacity <= capacity_) throw std::bad_alloc();
-        void* const block = std::realloc(has_block() ? place_ : nullptr, sizeof(void*) * capacity);
-        if (block == nullptr) throw std::bad_alloc();
-        if (!has_block()) *static_cast<void**>(block) = place_;
+        void* const block = pooled::operator new(sizeof(void*) * capacity);
+        std::memcpy(block, items(), sizeof(void*) * size_);
+        if (has_block()) pooled::operator delete(place_);
         place_ = block;
         capacity_ = capacity;
     }

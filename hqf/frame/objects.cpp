@@ -1,5 +1,6 @@
 #include "hqf/frame/objects.h"
 
+#include <bit>
 #include <cmath>
 #include <cstring>
 #include <memory>
@@ -27,6 +28,7 @@ template<class action>
 bool with_value_type(kind what, action&& act) {
     switch (what) {
     case kind::text: act(static_cast<std::wstring*>(nullptr)); return true;
+    case kind::enumerated: act(static_cast<enumerated*>(nullptr)); return true;
     case kind::real: act(static_cast<double*>(nullptr)); return true;
     case kind::integer: act(static_cast<int*>(nullptr)); return true;
     case kind::natural: act(static_cast<unsigned int*>(nullptr)); return true;
@@ -148,9 +150,13 @@ bool equal_rows(const row& r, const void* a, const void* b) {
     return equal_members(*r.type, left.object, right.object);
 }
 
-bool is_row_ok(const row& r, const void* object) {
-    if (!r.has(mandatory_row) || r.has(not_counted)) return true;
-    return r.is_list() ? member_at<list_base>(object, r.value).size() != 0 : flag_of(r, object);
+/// Whether all rows that have a bit are there.
+bool are_there(std::uint32_t bits, const row* rows, const void* object) {
+    for (; bits != 0; bits &= bits - 1) {
+        const row& r = rows[std::countr_zero(bits)];
+        if (r.is_list() ? member_at<list_base>(object, r.value).size() == 0 : !flag_of(r, object)) return false;
+    }
+    return true;
 }
 
 choice_slot& choice_of(const class_rows& rows, void* object) {
@@ -267,11 +273,7 @@ bool equal_members(const class_rows& rows, const void* a, const void* b) {
 bool is_occurs_ok(const class_rows& rows, const void* object) {
     if (rows.slot != 0) return member_at<int>(object, rows.slot) != rows.none();
     if (rows.is_nil(object)) return true;
-    for (unsigned int i = 0; i < rows.attribute_count; ++i)
-        if (!is_row_ok(rows.attributes[i], object)) return false;
-    for (unsigned int i = 0; i < rows.row_count; ++i)
-        if (!is_row_ok(rows.rows[i], object)) return false;
-    return true;
+    return are_there(rows.needed_attributes, rows.attributes, object) && are_there(rows.needed_rows, rows.rows, object);
 }
 
 void release_choice(const class_rows& rows, void* object) {

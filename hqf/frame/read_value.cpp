@@ -24,6 +24,7 @@ public:
     lmx::elmx_error run() {
         switch (target_.what) {
         case kind::text: text(); break;
+        case kind::enumerated: literal(); break;
         case kind::real: real(); break;
         case kind::integer: integer<int>(to_int); break;
         case kind::natural: integer<unsigned int>(to_unsigned); break;
@@ -66,6 +67,16 @@ private:
         lmx::vtostring(value, text_);
         if (rules != nullptr && rules->texts != nullptr)
             require(rules->texts->number_of(value) != 0, lmx::err_value_does_not_match_enumerations);
+    }
+
+    void literal() {
+        const literals& texts = *target_.rules->texts;
+        auto& value = *static_cast<enumerated*>(target_.value);
+        std::wstring text;
+        lmx::vtostring(text, text_);
+        // Stored first: a text that is no literal stays where the handler goes on.
+        value.set_text(text, texts);
+        require(value.number() != 0, lmx::err_value_does_not_match_enumerations);
     }
 
     void real() {

@@ -16,6 +16,7 @@ struct storage_traits;
 
 template<class value_type>
 constexpr kind kind_of_value = std::is_same_v<value_type, std::wstring>      ? kind::text
+                               : std::is_same_v<value_type, enumerated>      ? kind::enumerated
                                : std::is_same_v<value_type, double>          ? kind::real
                                : std::is_same_v<value_type, int>             ? kind::integer
                                : std::is_same_v<value_type, unsigned int>    ? kind::natural

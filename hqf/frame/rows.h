@@ -94,7 +94,8 @@ struct facets {
 
 /// How a member is stored and what it holds.
 enum class kind : std::uint8_t {
-    text, // std::wstring; an enumerated one has facets with literals
+    text,
+    enumerated, // its facets have the literals
     real,
     integer,
     natural,
@@ -149,6 +150,16 @@ struct row {
 };
 static_assert(sizeof(row) == 40);
 
+/// A bit for each row that must be there before an object can be written.
+template<std::size_t count>
+constexpr std::uint32_t needed(const row (&rows)[count]) {
+    static_assert(count <= 32);
+    std::uint32_t bits = 0;
+    for (std::size_t i = 0; i < count; ++i)
+        if (rows[i].has(mandatory_row) && !rows[i].has(not_counted)) bits |= std::uint32_t{1} << i;
+    return bits;
+}
+
 /// One member of a substitution group.
 struct group_member {
     const element_name* name;
@@ -188,6 +199,10 @@ struct class_rows {
     bool minimums_at_end = false;
     /// A nilled element still writes its attributes.
     bool attributes_when_nil = false;
+
+    /// What is_occurs_ok() asks for: a bit for each attribute, and for each row.
+    std::uint32_t needed_attributes = 0;
+    std::uint32_t needed_rows = 0;
 
     std::uint8_t attribute_count = 0;
     /// Children; the body of a class with simple content; the options of a choice.

@@ -5,6 +5,7 @@
 #pragma once
 
 #include <memory>
+#include <string>
 #include <utility>
 
 #include "hqf/frame/list.h"
@@ -12,10 +13,47 @@
 namespace hqf::frame {
 
 struct class_rows;
+struct literals;
 
 /// Gives the friend of every model class that builds its rows (see hqf/frame/rows.h).
 template<class model_class>
 struct rows_of;
+
+/// An enumerated text, held as the number of its literal. A text that is none, which an application's error handler may
+/// let through, is held beside it.
+class enumerated {
+public:
+    enumerated() = default;
+    enumerated(const enumerated& other)
+        : number_(other.number_)
+        , free_text_(other.free_text_ == nullptr ? nullptr : std::make_unique<std::wstring>(*other.free_text_)) {}
+    enumerated& operator=(enumerated other) noexcept {
+        swap(*this, other);
+        return *this;
+    }
+    friend void swap(enumerated& a, enumerated& b) noexcept {
+        std::swap(a.number_, b.number_);
+        a.free_text_.swap(b.free_text_);
+    }
+    friend bool operator==(const enumerated& a, const enumerated& b) {
+        if (a.free_text_ == nullptr || b.free_text_ == nullptr)
+            return a.number_ == b.number_ && a.free_text_ == b.free_text_;
+        return *a.free_text_ == *b.free_text_;
+    }
+
+    /// From 1, in schema order; 0 for no literal.
+    int number() const { return number_; }
+    void set_number(int number) {
+        number_ = number;
+        free_text_ = nullptr;
+    }
+    const std::wstring& text(const literals& texts) const;
+    void set_text(const std::wstring& text, const literals& texts);
+
+private:
+    int number_ = 0;
+    std::unique_ptr<std::wstring> free_text_;
+};
 
 /// A simple value and whether it was set. The engine sees every single simple member as this.
 template<class value_type>

@@ -44,6 +44,7 @@ private:
     lmx::elmx_error bad_selector(const class_rows& rows);
     void list(const row& r, const list_base& items);
     bool stored_value(const row& r, const void* object);
+    void literal(const enumerated& value, const literals& texts);
     void option_value(const row& r, const choice_slot& slot);
 
     template<class value_type>
@@ -134,6 +135,7 @@ void element_writer::attribute(const row& r, const void* object) {
 bool element_writer::stored_value(const row& r, const void* object) {
     switch (r.what) {
     case kind::text: out_.value(member_at<std::wstring>(object, r.value)); return true;
+    case kind::enumerated: literal(member_at<enumerated>(object, r.value), *r.rules->texts); return true;
     case kind::real: out_.value(member_at<double>(object, r.value)); return true;
     case kind::integer: out_.value(member_at<int>(object, r.value)); return true;
     case kind::natural: out_.value(member_at<unsigned int>(object, r.value)); return true;
@@ -143,6 +145,14 @@ bool element_writer::stored_value(const row& r, const void* object) {
     case kind::binary: out_.value(member_at<lmx::c_binary>(object, r.value)); return true;
     default: return false;
     }
+}
+
+/// No literal has a character that would be escaped.
+void element_writer::literal(const enumerated& value, const literals& texts) {
+    if (const int number = value.number(); number != 0)
+        out_.text(texts.narrow[number - 1], texts.lengths[number - 1]);
+    else
+        out_.value(value.text(texts));
 }
 
 lmx::elmx_error element_writer::content(const class_rows& rows, void* object) {

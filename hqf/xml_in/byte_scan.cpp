@@ -37,14 +37,6 @@ unsigned mask_of(__m128i bytes) {
     return static_cast<unsigned>(_mm_movemask_epi8(bytes));
 }
 
-unsigned text_end_mask(const char* at, char wanted) {
-    const __m128i bytes = load(at);
-    const __m128i found = _mm_or_si128(
-        _mm_cmpeq_epi8(bytes, _mm_set1_epi8(wanted)),
-        _mm_or_si128(_mm_cmpeq_epi8(bytes, _mm_set1_epi8('&')), _mm_cmpeq_epi8(bytes, _mm_set1_epi8('\r'))));
-    return static_cast<unsigned>(_mm_movemask_epi8(found));
-}
-
 // The line feeds in the whole 64-byte blocks of a run, and whether there is a CR; `from` moves behind the blocks.
 long long count_line_feeds_in_blocks(const char*& from, const char* stop, bool& has_returns) {
     __m128i returns = _mm_setzero_si128();
@@ -117,23 +109,6 @@ const char* find_not_plain(const char* from, const char* stop) {
         }
         if (at >= stop) return at;
     }
-}
-
-const char* find_text_end(const char* from, const char* stop, char wanted) {
-    const char* at = from;
-#if defined(__SSE2__)
-    for (; at < stop; at += 16) {
-        if (const unsigned mask = text_end_mask(at, wanted)) {
-            at += std::countr_zero(mask);
-            break;
-        }
-    }
-    return at < stop ? at : stop;
-#else
-    while (at < stop && *at != wanted && *at != '&' && *at != '\r')
-        ++at;
-    return at;
-#endif
 }
 
 long long count_line_ends(const char* from, const char* stop, unsigned char before) {

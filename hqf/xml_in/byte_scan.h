@@ -18,7 +18,27 @@ namespace hqf {
 const char* find_not_plain(const char* from, const char* stop);
 
 /// Where the first `wanted`, '&' or CR stands, or `stop`. Precondition: sixteen bytes can be read behind `stop`.
-const char* find_text_end(const char* from, const char* stop, char wanted);
+inline const char* find_text_end(const char* from, const char* stop, char wanted) {
+    const char* at = from;
+#if defined(__SSE2__)
+    for (; at < stop; at += 16) {
+        const __m128i bytes = _mm_loadu_si128(reinterpret_cast<const __m128i*>(at));
+        const __m128i special =
+            _mm_or_si128(_mm_cmpeq_epi8(bytes, _mm_set1_epi8('&')), _mm_cmpeq_epi8(bytes, _mm_set1_epi8('\r')));
+        const auto found = static_cast<unsigned>(
+            _mm_movemask_epi8(_mm_or_si128(_mm_cmpeq_epi8(bytes, _mm_set1_epi8(wanted)), special)));
+        if (found != 0) {
+            at += std::countr_zero(found);
+            break;
+        }
+    }
+    return at < stop ? at : stop;
+#else
+    while (at < stop && *at != wanted && *at != '&' && *at != '\r')
+        ++at;
+    return at;
+#endif
+}
 
 /// Where the first byte above a blank stands, or `stop`. Precondition: sixteen bytes can be read behind `stop`.
 inline const char* skip_space(const char* from, const char* stop) {

@@ -104,22 +104,9 @@ bool window::prove_more() {
     return true;
 }
 
-bool window::prove(std::size_t n) {
-    while (static_cast<std::size_t>(edge_ - p) < n)
+bool window::prove(const char* at, std::size_t n) {
+    while (static_cast<std::size_t>(edge_ - at) < n)
         if (!prove_more()) return false;
-    return true;
-}
-
-bool window::text(char stop, std::string_view& piece) {
-    const char* at = p;
-    for (;;) {
-        at = find_text_end(at, edge_, stop);
-        if (at != edge_) break;
-        if (!prove_more()) return false;
-    }
-    if (*at != stop) return false;
-    piece = {p, static_cast<std::size_t>(at - p)};
-    p = at;
     return true;
 }
 

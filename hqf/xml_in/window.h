@@ -5,7 +5,6 @@
 
 #include <cstddef>
 #include <cstdint>
-#include <string_view>
 
 namespace lmx {
 class c_get_as_utf8;
@@ -20,9 +19,10 @@ namespace hqf {
 /// in memory, or in a file that this library opened, wherever the general path stands between two characters; reading
 /// on through the general path closes it, and both go on from the same byte with the same line number.
 ///
-/// A window reports nothing and decides nothing. Its operations either do what they say or change nothing; whoever gets
-/// false goes back to a mark and lets the general path read the same bytes. Only `begin_step` moves bytes in memory:
-/// marks and pieces last until its next call.
+/// A window reports nothing and decides nothing. Its looks ahead take a place and give the place behind what they
+/// found, or null; a step moves the window's position when it has read all that it wanted, and one that has not leaves
+/// it where it was, for the general path to read the same bytes. So the place travels in a register from look to look.
+/// Only `begin_step` moves bytes in memory: places last until its next call.
 class window {
 public:
     explicit window(lmx::c_get_as_utf8& owner)
@@ -30,7 +30,8 @@ public:
     window(const window&) = delete;
     window& operator=(const window&) = delete;
 
-    /// The next byte. May be moved forward within `edge()`; at least 64 bytes from here can be loaded.
+    /// The next byte, where the last step ended. May be moved forward within `edge()`; at least 64 bytes from any place
+    /// up to there can be loaded.
     const char* p = nullptr;
 
     /// Opens the window if need be and sees to it that a fair run of bytes lies ahead. False: take a general step.
@@ -45,24 +46,26 @@ public:
     /// Hands position, line and last character back to the general path.
     void close();
 
-    const char* mark() const { return p; }
-    /// Back to a mark of this step.
-    void back(const char* mark) { p = mark; }
-
     /// Up to here bytes are proven: UTF-8 that the general path would deliver unchanged, without U+0085 and U+2028,
     /// without control characters but 9 to 13. A CR may be there: as white space it is harmless, in a value it is not.
     const char* edge() const { return edge_; }
-    /// Whether `n` bytes from `p` are proven; tries to prove more if not.
-    bool room(std::size_t n) { return static_cast<std::size_t>(edge_ - p) >= n || prove(n); }
+    /// Whether `n` bytes from `at` are proven; tries to prove more if not.
+    bool room(const char* at, std::size_t n) { return static_cast<std::size_t>(edge_ - at) >= n || prove(at, n); }
     /// Over white space, as far as bytes can be proven.
-    void skip_space() {
+    const char* skip_space(const char* at) {
         do {
-            p = hqf::skip_space(p, edge_);
-        } while (p == edge_ && prove_more());
+            at = hqf::skip_space(at, edge_);
+        } while (at == edge_ && prove_more());
+        return at;
     }
-    /// Gives the bytes up to `stop`, which stays next. False if a '&' or a CR comes first, or bytes that can't be
-    /// proven. Line feeds and tabs may be among them.
-    bool text(char stop, std::string_view& piece);
+    /// Where the first `stop` stands. Null if a '&' or a CR comes first, or bytes that can't be proven. Line feeds and
+    /// tabs may come before.
+    const char* find(const char* at, char stop) {
+        do {
+            at = find_text_end(at, edge_, stop);
+        } while (at == edge_ && prove_more());
+        return at != edge_ && *at == stop ? at : nullptr;
+    }
 
     /// The line at `p`. Lines are counted when someone asks, each byte once but for those of the current step.
     int line();
@@ -71,7 +74,7 @@ private:
     bool open();
     bool find_run();
     bool settle_ungot();
-    bool prove(std::size_t n);
+    bool prove(const char* at, std::size_t n);
     bool prove_more();
     unsigned char byte_before(const char* place) const;
     void count_up_to(const char* place);

@@ -97,6 +97,39 @@ TEST(accessors, enumerations) {
     EXPECT_EQ(tolerance.getenum_PrimaryIlluminant(), 0) << "nothing stored is no literal";
 }
 
+/// A text that is no literal stays one that only a handler can bring in, and is carried along like any other.
+TEST(accessors, a_text_beside_the_literals_is_kept) {
+    class lenient : public lmx::c_xml_reader_memory {
+    public:
+        using c_xml_reader_memory::c_xml_reader_memory;
+        lmx::elmx_error user_handle_error(lmx::elmx_error, const std::string&, const char*, int) override {
+            return lmx::err_no_error;
+        }
+    };
+    ColorSpaceSRGB made;
+    made.append_ChangeHistory("2024-01-01T00:00:00Z");
+    made.get_ColorSpaceSpecificationSpectrumTristimulus().setnil_ColorSpaceSpecificationSpectrumTristimulus();
+    made.set_Red(0), made.set_Green(0), made.set_Blue(0);
+    made.set_ColorDepth(L"ColorDepth_8");
+    std::string text;
+    ASSERT_EQ(made.marshal(&text), 0);
+    text.replace(text.find("ColorDepth_8"), 12, "Depth &lt;3");
+    lenient reader(text.data(), static_cast<unsigned int>(text.size()));
+    ColorSpaceSRGB odd;
+    ASSERT_EQ(odd.unmarshal(reader), 0);
+    EXPECT_EQ(odd.get_ColorDepth(), L"Depth <3");
+    EXPECT_EQ(odd.getenum_ColorDepth(), 0);
+    ColorSpaceSRGB copy(odd);
+    EXPECT_TRUE(hqf::equal(copy, odd));
+    EXPECT_FALSE(hqf::equal(copy, made));
+    std::string again;
+    EXPECT_EQ(copy.marshal(&again), 0);
+    EXPECT_EQ(again, text);
+    copy.set_ColorDepth(L"ColorDepth_8");
+    EXPECT_FALSE(hqf::equal(copy, odd)) << "a literal beside another text";
+    EXPECT_EQ(odd.get_ColorDepth(), L"Depth <3") << "the copy is deep";
+}
+
 TEST(accessors, optional_and_defaulted_members) {
     ColorSpaceRGBType rgb;
     rgb.set_Alpha(0.5);

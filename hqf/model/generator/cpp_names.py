@@ -26,6 +26,11 @@ def value_type(type_: SimpleType) -> str:
     return VALUE_TYPES[type_.kind]
 
 
+def storage_type(type_: SimpleType) -> str:
+    """How a single member or a body holds its value."""
+    return "hqf::frame::enumerated" if type_.literals else value_type(type_)
+
+
 def argument_type(type_: SimpleType) -> str:
     """How a value goes in and comes out: text, dates and bytes by reference, numbers by value."""
     return f"const {value_type(type_)}&" if type_.kind in BY_REFERENCE else value_type(type_)

@@ -62,7 +62,7 @@ class _Bodies:
 
     def life_cycle(self) -> None:
         cls, name = self.cls, self.cls.name
-        defaults = " ".join(f"{a.name}_.value = {self.default(a.type, a.default)};"
+        defaults = " ".join(self.default(f"{a.name}_", a.type, a.default)
                             for a in cls.attributes if a.default is not None)
         if cls.document:
             self.define("", f"{name}()", "SdkInformationStamper().stampRead(*this);")
@@ -91,8 +91,8 @@ class _Bodies:
         self.define("bool", "is_occurs_ok()", f"return frame::is_occurs_ok({self.rows}, this);", const=True)
 
     @staticmethod
-    def default(type_: SimpleType, literal: str) -> str:
-        return f"{literals_name(type_)}.wide[{type_.literals.index(literal)}]"
+    def default(member: str, type_: SimpleType, literal: str) -> str:
+        return f"{member}.value.set_number({type_.literals.index(literal) + 1});"
 
     def identity(self) -> None:
         cls, name = self.cls, self.cls.name
@@ -109,24 +109,25 @@ class _Bodies:
 
     def value(self, name: str, member: str, type_: SimpleType, optional: bool, default: str | None = None,
               nil: str = "") -> None:
-        self.define(argument_type(type_), f"get_{name}()", f"return {member}.value;", const=True)
+        text = f".text({literals_name(type_)})" if type_.literals else ""
+        self.define(argument_type(type_), f"get_{name}()", f"return {member}.value{text};", const=True)
         rules = rules_pointer(type_)
         tail = "" if rules == "nullptr" else ", " + rules
         self.define(ERROR, f"set_{name}({argument_type(type_)} value)",
                     f"return frame::store({member}, {nil}value{tail});")
         if optional:
-            restore = f" {member}.value = {self.default(type_, default)};" if default is not None else ""
+            restore = f" {self.default(member, type_, default)}" if default is not None else ""
             self.define("bool", f"isset_{name}()", f"return {member}.set;", const=True)
             self.define("void", f"unset_{name}()", f"{member}.set = false;{restore}")
-        self.enumeration(name, type_)
+        self.enumeration(name, type_, f"{member}.value.number()")
 
-    def enumeration(self, name: str, type_: SimpleType) -> None:
+    def enumeration(self, name: str, type_: SimpleType, stored_number: str) -> None:
         if not type_.literals:
             return
         texts = literals_name(type_)
         enumeration = f"Eenum_{name}"
         self.lines.append(f"{self.cls.name}::{enumeration} {self.cls.name}::getenum_{name}() const {{ "
-                          f"return static_cast<{enumeration}>({texts}.number_of(get_{name}())); }}")
+                          f"return static_cast<{enumeration}>({stored_number}); }}")
         self.define("bool", f"setenum_{name}({enumeration} number)",
                     f"return frame::store_literal({texts}, number, "
                     f"[this](const std::wstring& text) {{ return set_{name}(text); }});")
@@ -220,7 +221,7 @@ class _Bodies:
                             const=True)
                 self.define(ERROR, f"set_{name}({argument} value)",
                             f"return frame::store_option({self.rows}, this, slot_, {chosen}, value);")
-                self.enumeration(name, option.type)
+                self.enumeration(name, option.type, f"{literals_name(option.type)}.number_of(get_{name}())")
             else:
                 item = option.class_name
                 self.define(f"{item}&", f"get_{name}()",

@@ -5,7 +5,7 @@ from __future__ import annotations
 import textwrap
 
 from cpp_names import (NOTICE, argument_type, bounds_text, enumerations, identifier, is_virtual, made_on_first_use,
-                       value_type)
+                       storage_type, value_type)
 from vocabulary import Attribute, Body, Member, ModelClass, SimpleType, Vocabulary
 
 
@@ -202,13 +202,13 @@ class _Header:
             presence = f"Attribute with the default \"{attribute.default}\", always written."
         self.value_accessors(attribute.name, attribute.type, f"{attribute.doc} {presence}", not attribute.required)
         kind = "mandatory" if attribute.required else "optional"
-        self.storage.append(f"hqf::frame::{kind}<{value_type(attribute.type)}> {attribute.name}_;")
+        self.storage.append(f"hqf::frame::{kind}<{storage_type(attribute.type)}> {attribute.name}_;")
 
     def body(self, body: Body) -> None:
         name = self.cls.name
         presence = "Body, optional in the model; the reader asks for it." if body.optional else "Mandatory body."
         self.value_accessors(name, body.type, f"{body.doc} {presence}", body.optional)
-        self.storage.append(f"hqf::frame::{'optional' if body.optional else 'mandatory'}<{value_type(body.type)}> body_;")
+        self.storage.append(f"hqf::frame::{'optional' if body.optional else 'mandatory'}<{storage_type(body.type)}> body_;")
 
     def nil(self) -> None:
         name = self.cls.name
@@ -250,7 +250,7 @@ class _Header:
             self.lines.pop()
             self.value_accessors(name, member.type, doc, not member.minimum)
             kind = "mandatory" if member.minimum else "optional"
-            self.storage.append(f"hqf::frame::{kind}<{value_type(member.type)}> {name}_;")
+            self.storage.append(f"hqf::frame::{kind}<{storage_type(member.type)}> {name}_;")
         elif member.kind == "simple":
             self.simple_list(member, doc)
         elif member.repeating:

@@ -220,11 +220,13 @@ class _Tables:
             facts.append(".minimums_at_end = true")
         if cls.attributes_when_nil:
             facts.append(".attributes_when_nil = true")
+        rows = self.child_rows(cls)
+        facts += [f".needed_{what} = frame::needed(frame::rows_of<{name}>::{what})"
+                  for what, some in (("attributes", attributes), ("rows", rows)) if some]
         if attributes:
             lines.append(f"static constexpr lmx::s_event_map {name}_attribute_events[] = "
                          f"{{{self.event_rows([a.name for a in attributes], '1')}}};")
             facts.append(f".attribute_count = {len(attributes)}")
-        rows = self.child_rows(cls)
         if rows:
             facts.append(f".row_count = {len(rows)}")
         if cls.group:
