@@ -38,44 +38,39 @@ std::size_t wide_bound(const char* data, std::size_t size) {
     return bound;
 }
 
-wchar_t* decode(const char* in, const char* end, wchar_t* out) {
-    char32_t pending = 0;
-    while (in < end) {
-        char32_t value = 0;
-        const std::size_t length = decode_sequence(in, end, value);
-        if (length == 0) break;
-        in += length;
-        if (pending != 0) {
-            if (!is_low_surrogate(value)) break;
-            *out++ = static_cast<wchar_t>(pending);
-            *out++ = static_cast<wchar_t>(value);
-            pending = 0;
-        } else if (is_high_surrogate(value)) {
-            pending = value;
-        } else if (value > 0xFFFF) {
-            value -= 0x10000;
-            *out++ = static_cast<wchar_t>(0xD800 + ((value >> 10) & 0x3FF));
-            *out++ = static_cast<wchar_t>(0xDC00 + (value & 0x3FF));
-        } else {
-            *out++ = static_cast<wchar_t>(value);
-        }
+/// Decodes the character at `in` and moves both; false where none can be decoded. A high surrogate is one only with its
+/// other half behind it.
+bool decode_one(const char*& in, const char* end, wchar_t*& out) {
+    char32_t value = 0;
+    const std::size_t length = decode_sequence(in, end, value);
+    if (length == 0) return false;
+    in += length;
+    if (is_high_surrogate(value)) {
+        char32_t low = 0;
+        const std::size_t low_length = in < end ? decode_sequence(in, end, low) : 0;
+        if (low_length == 0 || !is_low_surrogate(low)) return false;
+        in += low_length;
+        *out++ = static_cast<wchar_t>(value);
+        value = low;
+    } else if (value > 0xFFFF) {
+        value -= 0x10000;
+        *out++ = static_cast<wchar_t>(0xD800 + ((value >> 10) & 0x3FF));
+        value = 0xDC00 + (value & 0x3FF);
     }
-    return out;
+    *out++ = static_cast<wchar_t>(value);
+    return true;
 }
 
-/// As many bytes as these elements give, or a few more.
-std::size_t utf8_bound(const wchar_t* data, std::size_t size) {
-    std::size_t bound = size;
-    for (std::size_t i = 0; i < size; ++i) {
-        const auto c = static_cast<char32_t>(data[i]);
-        bound += static_cast<std::size_t>(c >= 0x80) + static_cast<std::size_t>(c >= 0x800) +
-                 static_cast<std::size_t>(c >= 0x10000);
-    }
-    return bound;
+bool is_ascii(const wchar_t* data, const wchar_t* end) {
+    std::uint32_t all = 0;
+    for (; data != end; ++data)
+        all |= static_cast<std::uint32_t>(*data);
+    return all < 0x80;
 }
 
-char* encode(const wchar_t* in, const wchar_t* end, char* out) {
-    while (in < end) {
+/// Encodes up to `stop`, and what is needed behind it for the last character.
+char* encode(const wchar_t*& in, const wchar_t* stop, const wchar_t* end, char* out) {
+    while (in < stop) {
         char32_t c = to_character(*in++);
         if (is_high_surrogate(c)) {
             if (in < end && is_low_surrogate(static_cast<char32_t>(*in)))
@@ -87,27 +82,25 @@ char* encode(const wchar_t* in, const wchar_t* end, char* out) {
     return out;
 }
 
-void widen(const char* data, std::size_t size, wchar_t* to) {
-    for (std::size_t i = 0; i < size; ++i)
-        to[i] = static_cast<wchar_t>(data[i]);
-}
+/// Long texts go by way of a piece that stays in the cache: growing by resize() would have them written twice.
+constexpr std::ptrdiff_t piece_size = 1024;
 
 void append_ascii(std::wstring& out, const char* data, std::size_t size) {
-    constexpr std::size_t step = 1024;
-    const std::size_t before = out.size();
-    if (size <= step) {
-        out.resize(before + size);
-        return widen(data, size, out.data() + before);
-    }
-    // By way of a piece that stays in the cache: resize() would have all of a long text written twice.
-    out.reserve(before + size);
-    expect_filling(out.data() + before, size * sizeof(wchar_t));
-    wchar_t piece[step];
-    for (std::size_t done = 0; done < size; done += step) {
-        const std::size_t count = std::min(step, size - done);
-        widen(data + done, count, piece);
+    wchar_t piece[piece_size];
+    for (std::size_t count = 0; size != 0; data += count, size -= count) {
+        count = std::min<std::size_t>(size, piece_size);
+        for (std::size_t i = 0; i < count; ++i)
+            piece[i] = static_cast<wchar_t>(data[i]);
         out.append(piece, count);
     }
+}
+
+/// Room for a text that is about to come, in one step if it is long.
+template<class text_type>
+void make_room(text_type& text, std::size_t size) {
+    if (size <= std::size_t{piece_size} || text.capacity() - text.size() >= size) return;
+    text.reserve(text.size() + size);
+    expect_filling(text.data() + text.size(), size * sizeof(text[0]));
 }
 
 } // namespace
@@ -135,27 +128,39 @@ std::size_t decode_sequence(const char* in, const char* end, char32_t& value) {
 }
 
 void append_wide(std::wstring& out, const char* data, std::size_t size) {
-    const std::size_t run = ascii_run(data, size);
-    append_ascii(out, data, run);
-    if (run == size) return;
-    const std::size_t before = out.size();
-    out.resize(before + wide_bound(data + run, size - run));
-    const wchar_t* const end = decode(data + run, data + size, out.data() + before);
-    out.resize(static_cast<std::size_t>(end - out.data()));
+    const char* const end = data + size;
+    std::size_t run = ascii_run(data, size);
+    make_room(out, run == size ? size : run + wide_bound(data + run, size - run));
+    for (;;) {
+        append_ascii(out, data, run);
+        data += run;
+        if (data == end) return;
+        wchar_t piece[piece_size];
+        wchar_t* to = piece;
+        bool good = true;
+        while (good && data != end && static_cast<unsigned char>(*data) >= 0x80 && to - piece < piece_size - 1)
+            good = decode_one(data, end, to);
+        out.append(piece, static_cast<std::size_t>(to - piece));
+        if (!good) return;
+        run = ascii_run(data, static_cast<std::size_t>(end - data));
+    }
 }
 
 void append_utf8(std::string& out, const wchar_t* data, std::size_t size) {
-    const std::size_t bound = utf8_bound(data, size);
-    const std::size_t before = out.size();
-    out.resize(before + bound);
-    char* const to = out.data() + before;
-    if (bound == size) {
-        for (std::size_t i = 0; i < size; ++i)
-            to[i] = static_cast<char>(data[i]);
-        return;
+    constexpr std::ptrdiff_t longest = 4; // of a character's bytes
+    const wchar_t* const end = data + size;
+    make_room(out, size);
+    while (data != end) {
+        char piece[longest * piece_size];
+        char* to = piece;
+        const wchar_t* const stop = data + std::min(end - data, piece_size);
+        if (is_ascii(data, stop))
+            for (; data != stop; ++data)
+                *to++ = static_cast<char>(*data);
+        else
+            to = encode(data, stop, end, piece);
+        out.append(piece, static_cast<std::size_t>(to - piece));
     }
-    const char* const end = encode(data, data + size, to);
-    out.resize(static_cast<std::size_t>(end - out.data()));
 }
 
 char* encode_utf8(char32_t c, char* out) {
