@@ -95,10 +95,10 @@ void append_ascii(std::wstring& out, const char* data, std::size_t size) {
     }
 }
 
-/// Room for a text that is about to come, in one step if it is long.
+/// Room in one step for a long text that is about to come.
 template<class text_type>
 void make_room(text_type& text, std::size_t size) {
-    if (size <= std::size_t{piece_size} || text.capacity() - text.size() >= size) return;
+    if (text.capacity() - text.size() >= size) return;
     text.reserve(text.size() + size);
     expect_filling(text.data() + text.size(), size * sizeof(text[0]));
 }
@@ -130,7 +130,7 @@ std::size_t decode_sequence(const char* in, const char* end, char32_t& value) {
 void append_wide(std::wstring& out, const char* data, std::size_t size) {
     const char* const end = data + size;
     std::size_t run = ascii_run(data, size);
-    make_room(out, run == size ? size : run + wide_bound(data + run, size - run));
+    if (size > std::size_t{piece_size}) make_room(out, run + wide_bound(data + run, size - run));
     for (;;) {
         append_ascii(out, data, run);
         data += run;
@@ -149,7 +149,7 @@ void append_wide(std::wstring& out, const char* data, std::size_t size) {
 void append_utf8(std::string& out, const wchar_t* data, std::size_t size) {
     constexpr std::ptrdiff_t longest = 4; // of a character's bytes
     const wchar_t* const end = data + size;
-    make_room(out, size);
+    if (size > std::size_t{piece_size}) make_room(out, size);
     while (data != end) {
         char piece[longest * piece_size];
         char* to = piece;
