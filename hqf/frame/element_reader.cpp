@@ -151,10 +151,10 @@ void element_reader::end_tag() {
         if (fast_end_tag()) return;
         lmx::elmx_error error = lmx::err_no_error;
         reader_access::settle(reader_);
-        reader_.get_element_event(successors_, &error, &reader_.item_name);
+        reader_.get_element_event(successors(), &error, &reader_.item_name);
         // Behind children the report names what was read; in place of a value or of nothing it names the element.
         if (error != lmx::err_no_error &&
-            !report(error, successors_ != nullptr ? reader_.item_name : name_->get_str(), __LINE__))
+            !report(error, last_row_ >= 0 ? reader_.item_name : name_->get_str(), __LINE__))
             return;
     }
     if (event() != lmx::EXE_ELEMENT_END || *name_ != reader_.item_name)
@@ -200,12 +200,18 @@ bool element_reader::first_event() {
     return true;
 }
 
+/// The children that may still come: the table for the next general event, null before the first child.
+const lmx::s_event_map* element_reader::successors() const {
+    if (last_row_ < 0) return nullptr;
+    return rows_.shape == form::choice ? rows_.element_events : rows_.events_from(static_cast<unsigned int>(last_row_));
+}
+
 bool element_reader::next_event() {
     if (!begun_) return first_event();
     in_hand_ = true;
     lmx::elmx_error error = lmx::err_no_error;
     reader_access::settle(reader_);
-    reader_.get_element_event(successors_, &error, &reader_.item_name);
+    reader_.get_element_event(successors(), &error, &reader_.item_name);
     return error == lmx::err_no_error || report(error, reader_.item_name, __LINE__);
 }
 
@@ -231,7 +237,7 @@ bool element_reader::child_of_row(row_cursor& at) {
     const bool is_next =
         r.is_group() ? is_member(*r.type, reader_) : event() == r.name->event && (!at.seen || r.is_list());
     if (is_next) {
-        successors_ = rows_.events_from(at.row);
+        last_row_ = static_cast<int>(at.row);
         at.seen = true;
         if (!r.is_list()) at.next_row();
         return read_child(r);
@@ -240,7 +246,7 @@ bool element_reader::child_of_row(row_cursor& at) {
     at.next_row();
     if (seen || !r.has(mandatory_row) || r.what == kind::group_list) return true;
     if (!r.is_group()) return report(lmx::err_mandatory_element_missing, r.name->qualified(), __LINE__);
-    successors_ = rows_.events_from(at.row - 1);
+    last_row_ = static_cast<int>(at.row) - 1;
     return read_single_group(r);
 }
 
@@ -349,7 +355,7 @@ bool element_reader::choice() {
 
 bool element_reader::read_option(const row& option) {
     in_hand_ = false;
-    successors_ = rows_.element_events;
+    last_row_ = 0;
     choose_option(rows_, object_, static_cast<int>(&option - rows_.rows));
     auto& slot = member_at<choice_slot>(object_, rows_.slot);
     if (option.what == kind::child) return read_object(*option.type, slot.object);

@@ -75,6 +75,7 @@ private:
     bool fast_end_tag();
     bool fast_end_tag(window& in, const char* at);
     bool is_end_due(row_cursor at) const;
+    const lmx::s_event_map* successors() const;
     void fast_children(row_cursor& at);
     const row* find_row(const char* tag, row_cursor& at, int& member) const;
     bool fast_child(window& in, const char* at, const row& r, int member);
@@ -104,8 +105,8 @@ private:
     bool begun_ = false;
     /// The content ended with its first event.
     bool is_over_ = false;
-    /// The children that may still come: the table for the next general event.
-    const lmx::s_event_map* successors_ = nullptr;
+    /// The row of the last child read, -1 before the first.
+    int last_row_ = -1;
 };
 
 /// Makes a group hold an object as member `index`.

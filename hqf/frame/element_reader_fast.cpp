@@ -111,7 +111,7 @@ void element_reader::fast_children(row_cursor& at) {
         const row* const r = find_row(tag, found, member);
         if (r == nullptr || !fast_child(*in, tag, *r, member)) return;
         begun_ = true;
-        successors_ = rows_.events_from(found.row);
+        last_row_ = static_cast<int>(found.row);
         at = found;
         at.seen = true;
         if (!r->is_list()) at.next_row();
@@ -311,7 +311,7 @@ bool element_reader::fast_option() {
         remember_value(*option.name, whitespace_of(option.what, option.rules));
     }
     begun_ = true;
-    successors_ = rows_.element_events;
+    last_row_ = 0;
     return true;
 }
 

@@ -1,5 +1,6 @@
 #include "hqf/frame/fast_steps.h"
 
+#include <bit>
 #include <string_view>
 
 #include "hqf/frame/checks.h"
@@ -119,6 +120,24 @@ const char* parse_text(window& in, const char* at, const facets* rules, char sto
     const char* const end = take_text(in, at, stop, value);
     if (rules == nullptr) return end != nullptr ? end : take_text_with_references(in, at, stop, value);
     return end != nullptr && fulfils(value, *rules) ? end : nullptr;
+}
+
+/// Bytes up to the end of a name in a start tag, '>' or a blank; not beyond those that can be loaded.
+std::size_t name_length(const char* at) {
+    std::size_t length = 0;
+#if defined(__SSE2__)
+    for (; length < 64; length += 16) {
+        const __m128i bytes = _mm_loadu_si128(reinterpret_cast<const __m128i*>(at + length));
+        const __m128i ends =
+            _mm_or_si128(_mm_cmpeq_epi8(bytes, _mm_set1_epi8('>')), _mm_cmpeq_epi8(bytes, _mm_set1_epi8(' ')));
+        if (const auto mask = static_cast<unsigned int>(_mm_movemask_epi8(ends)); mask != 0)
+            return length + static_cast<std::size_t>(std::countr_zero(mask));
+    }
+#else
+    while (length < 64 && at[length] != '>' && at[length] != ' ')
+        ++length;
+#endif
+    return length;
 }
 
 bool is_set(const row& r, const void* object) {
@@ -270,9 +289,10 @@ const char* parse_type_attribute(window& in, const char* at, std::string_view& n
 }
 
 int find_member(const char* at, const class_rows& group) {
-    for (int i = 0; i < group.member_count; ++i)
-        if (starts(at, *group.members[i].name)) return i;
-    return -1;
+    constexpr std::size_t prefix = 5; // "<Hqf:"
+    const std::size_t length = name_length(at + prefix);
+    const std::uint8_t index = group.index->find(at + prefix, length);
+    return index < group.member_count && starts(at, *group.members[index].name) ? index : -1;
 }
 
 } // namespace hqf::frame

@@ -3,6 +3,7 @@
 /// position hasn't moved, and the general road reads the same bytes.
 #pragma once
 
+#include <bit>
 #include <cstdint>
 #include <cstring>
 #include <string_view>
@@ -42,8 +43,9 @@ inline bool same_text(const char* text, const char* constant, std::size_t size) 
         const __m128i left = _mm_loadu_si128(reinterpret_cast<const __m128i*>(text));
         const __m128i right = _mm_loadu_si128(reinterpret_cast<const __m128i*>(constant));
         const auto equal = static_cast<unsigned int>(_mm_movemask_epi8(_mm_cmpeq_epi8(left, right)));
-        if (size <= 16) return ((equal ^ 0xFFFFu) & (0xFFFFu >> (16 - size))) == 0;
-        if (equal != 0xFFFFu) return false;
+        const auto same = static_cast<unsigned int>(std::countr_one(equal));
+        if (size <= 16) return same >= size;
+        if (same != 16) return false;
         text += 16;
         constant += 16;
         size -= 16;

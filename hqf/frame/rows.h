@@ -166,6 +166,22 @@ struct group_member {
     const class_rows* type;
 };
 
+/// Finds a member of a group by its name without comparing it with all: by its length and two of its characters, which
+/// tell the members of the group apart.
+struct member_index {
+    /// Places of the characters, counted from the name's last one.
+    std::uint8_t first, second;
+    std::uint8_t factor;
+    /// The number of the member, or 255, by hash.
+    std::uint8_t members[128];
+
+    constexpr std::uint8_t find(const char* name, std::size_t length) const {
+        if (length <= first || length <= second) return 255;
+        const auto character = [&](std::size_t place) { return static_cast<unsigned char>(name[length - 1 - place]); };
+        return members[(length + character(first) + character(second) * factor) % sizeof members];
+    }
+};
+
 /// What the engine asks of an object in a group through its virtual operations: only they know its class.
 struct group_calls {
     void* (*clone)(const void* object);
@@ -212,6 +228,7 @@ struct class_rows {
     const row* rows = nullptr;
     /// Of a substitution group.
     const group_member* members = nullptr;
+    const member_index* index = nullptr;
 
     const lmx::s_event_map* attribute_events = nullptr;
     /// All children, in the order of the rows; for a group its members.

@@ -10,12 +10,22 @@ namespace lmx {
 class c_string_stack {
 public:
     /// Size in bytes, NULs included; not the number of names.
-    std::size_t get_stack_size() const { return bytes_.size(); }
+    std::size_t get_stack_size() const { return size_; }
 
 private:
     friend class c_string_stack_node;
 
+    void push(std::string_view name) {
+        const std::size_t size = size_ + name.size() + 1;
+        if (bytes_.size() < size) bytes_.resize(size < 256 ? 256 : 2 * size);
+        name.copy(&bytes_[size_], name.size());
+        bytes_[size - 1] = '\0';
+        size_ = size;
+    }
+
+    /// Room for names, used up to `size_`.
     std::string bytes_;
+    std::size_t size_ = 0;
 };
 
 /// Keeps a name on the stack for a scope. Nodes end in reverse order of their start.
@@ -23,13 +33,12 @@ class c_string_stack_node {
 public:
     c_string_stack_node(c_string_stack& stack, std::string_view name)
         : stack_(stack)
-        , offset_(stack.bytes_.size()) {
-        stack.bytes_.append(name);
-        stack.bytes_.push_back('\0');
+        , offset_(stack.size_) {
+        stack.push(name);
     }
     c_string_stack_node(const c_string_stack_node&) = delete;
     c_string_stack_node& operator=(const c_string_stack_node&) = delete;
-    ~c_string_stack_node() { stack_.bytes_.resize(offset_); }
+    ~c_string_stack_node() { stack_.size_ = offset_; }
 
     /// The name. Valid until the next name is pushed.
     const char* get_str() const { return stack_.bytes_.data() + offset_; }

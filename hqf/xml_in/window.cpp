@@ -18,7 +18,7 @@ constexpr std::ptrdiff_t margin = 64 + 4;
 constexpr std::ptrdiff_t chunk = 16 * 1024;
 // A file is read on when fewer bytes than this lie ahead, in blocks of the larger size. Values that don't fit are left
 // to the general path.
-constexpr std::size_t fair_run = 64 * 1024;
+constexpr std::ptrdiff_t fair_run = 64 * 1024;
 constexpr std::size_t file_block = 256 * 1024;
 
 } // namespace
@@ -65,9 +65,9 @@ bool window::settle_ungot() {
 }
 
 bool window::open() {
-    if (is_open_) close();
+    if (is_open()) close();
     if (owner_.errors_.is_fatal_errored() || owner_.state_ != lmx::c_get_as_utf8::utf8 ||
-        owner_.sequence_cursor_ != nullptr || !find_run() || !settle_ungot())
+        owner_.sequence_cursor_ != nullptr || !find_run() || run_->end == nullptr || !settle_ungot())
         return false;
     const std::uint64_t generation = file_ == nullptr ? 0 : file_->taken_from_file_;
     const bool is_edge_good = generation == edge_generation_ && edge_ >= run_->cursor && edge_ <= run_->end;
@@ -75,13 +75,13 @@ bool window::open() {
     if (file_ != nullptr) {
         file_->read_ahead(fair_run, file_block);
         edge_generation_ = file_->taken_from_file_;
-        low_water_ = file_->may_have_more() ? fair_run : 0;
     }
     p = step_start_ = opened_at_ = counted_ = run_->cursor;
     end_ = run_->end;
+    const bool may_have_more = file_ != nullptr && file_->may_have_more();
+    last_start_ = !may_have_more ? end_ : end_ - p > fair_run ? end_ - fair_run : p;
     edge_ = p + proven;
     owner_.run_ = &owner_.nothing_;
-    is_open_ = true;
     return true;
 }
 
@@ -90,7 +90,7 @@ void window::close() {
     owner_.last_character_ = byte_before(p);
     run_->cursor = p;
     owner_.run_ = run_;
-    is_open_ = false;
+    last_start_ = nullptr;
 }
 
 bool window::prove_more() {

@@ -36,13 +36,13 @@ public:
 
     /// Opens the window if need be and sees to it that a fair run of bytes lies ahead. False: take a general step.
     bool begin_step() {
-        if (is_open_ && static_cast<std::size_t>(end_ - p) >= low_water_) {
+        if (p < last_start_) {
             step_start_ = p;
             return true;
         }
         return open();
     }
-    bool is_open() const { return is_open_; }
+    bool is_open() const { return last_start_ != nullptr; }
     /// Hands position, line and last character back to the general path.
     void close();
 
@@ -80,13 +80,13 @@ private:
     void count_up_to(const char* place);
 
     lmx::c_get_as_utf8& owner_;
-    bool is_open_ = false;
     const char* end_ = nullptr;
     const char* edge_ = nullptr;
     const char* step_start_ = nullptr;
     const char* opened_at_ = nullptr;
     const char* counted_ = nullptr;
-    std::size_t low_water_ = 0;
+    // Before this place a fair run lies ahead; null while the window is closed.
+    const char* last_start_ = nullptr;
     // Where the source keeps its position, and where its block in memory starts.
     byte_run* run_ = nullptr;
     const char* block_start_ = nullptr;

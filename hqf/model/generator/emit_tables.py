@@ -2,6 +2,8 @@
 
 from __future__ import annotations
 
+import itertools
+
 from cpp_names import (NOTICE, identifier, literals_name, places, rows_name, rules_name, rules_pointer, simple_types)
 from vocabulary import Attribute, Member, ModelClass, SimpleType, Vocabulary
 from xsd import SchemaError
@@ -238,7 +240,8 @@ class _Tables:
         if cls.group:
             members = ", ".join(f"{{&element_{g.element}, {self.type_pointer(g.type_class)}}}" for g in cls.group)
             lines.append(f"static constexpr frame::group_member {name}_members[] = {{{members}}};")
-            facts.append(f".members = {name}_members")
+            lines.append(self.member_index(cls))
+            facts += [f".members = {name}_members", f".index = &{name}_index"]
         if attributes:
             facts.append(f".attribute_events = {name}_attribute_events")
         lines += self.element_events(cls, rows, facts)
@@ -276,6 +279,20 @@ class _Tables:
             lines.append(f"static constexpr std::uint8_t {name}_first_event[] = {{{', '.join(map(str, first))}}};")
             facts.append(f".first_event = {name}_first_event")
         return lines
+
+    @staticmethod
+    def member_index(cls: ModelClass) -> str:
+        """Places of two characters, from the end, and a factor that give each member's name a hash of its own."""
+        names = [entry.element for entry in cls.group]
+        shortest, size = min(map(len, names)), 128
+        for first, second, factor in itertools.product(range(shortest), range(shortest), range(1, 64)):
+            slots = {(len(name) + ord(name[-1 - first]) + ord(name[-1 - second]) * factor) % size: number
+                     for number, name in enumerate(names)}
+            if len(slots) == len(names):
+                row = ", ".join(str(slots.get(i, 255)) for i in range(size))
+                return (f"static constexpr frame::member_index {cls.name}_index = "
+                        f"{{{first}, {second}, {factor}, {{{row}}}}};")
+        raise SchemaError(f"{cls.name}: no two characters tell its members apart")
 
     def group_calls(self, cls: ModelClass) -> str:
         root = self.vocabulary.classes[cls.group[0].type_class].root
