@@ -2,8 +2,10 @@
 
 #include "hqf/xml_in/c_get_as_utf8.h"
 #include "hqf/xml_in/c_repository.h"
+#include "hqf/xml_in/open_values.h"
 
 #include <memory>
+#include <unordered_map>
 #include <vector>
 
 namespace lmx {
@@ -57,19 +59,22 @@ private:
 
     struct entity_frame {
         const char* cursor;
-        const char* start;
         c_unget_buffer ungot;
     };
     using entity_table = c_repository<const char*>;
 
     int get_from_entity();
     void keep_value_in_use(const entity_table& table, const char* name);
+    std::size_t refused_length(const char* value);
 
     std::vector<entity_frame> frames_;
+    hqf::open_values values_; // of the frames
     entity_table general_entities_;
     entity_table parameter_entities_;
     std::vector<std::unique_ptr<const char[]>> replaced_values_;
     std::uint64_t expanded_bytes_ = 0;
+    // Of values that were refused since an entity was defined.
+    std::unordered_map<const char*, std::size_t> refused_lengths_;
 };
 
 } // namespace lmx

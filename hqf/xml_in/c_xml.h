@@ -7,9 +7,9 @@
 #include "hqf/xml_in/c_xml_local.h"
 #include "hqf/xml_in/elmx_whitespace.h"
 #include "hqf/xml_in/elxp_xml_event.h"
+#include "hqf/xml_in/open_values.h"
 
 #include <string>
-#include <vector>
 
 namespace hqf {
 struct reader_access;
@@ -154,7 +154,7 @@ private:
     bool is_past_prolog_ = false;
     hqf::attribute_store attributes_;
     hqf::attribute_store declarations_;
-    std::vector<const char*> entities_in_place_;
+    hqf::open_values entities_in_place_;
 };
 
 } // namespace lmx

@@ -2,9 +2,14 @@
 
 #include "hqf/xml_in/c_repository.h"
 
+#include <memory>
 #include <string>
 
 #include "hqf/platform/api.h"
+
+namespace hqf {
+class scope_index;
+}
 
 namespace lmx {
 
@@ -19,18 +24,15 @@ public:
     c_xml_local(const c_xml_local& outer)
         : c_xml_local(&outer) {}
     c_xml_local& operator=(const c_xml_local&) = delete;
+    ~c_xml_local() {
+        if (index_ != nullptr) leave_index();
+    }
 
     /// Declares a prefix in this scope, or changes its number. The empty prefix is the default namespace.
-    void add_namespace(const char* prefix, int id) {
-        prefixes_.add(prefix, id);
-        active_ = this;
-        tell_change();
-    }
+    void add_namespace(const char* prefix, int id);
     /// Drops the declarations of this scope.
     void clear() {
-        if (prefixes_.empty()) return;
-        prefixes_.clear();
-        tell_change();
+        if (!prefixes_.empty()) drop_declarations();
     }
     /// The number of a prefix by the nearest declaration, or 0. `xml` is 2 everywhere.
     int find_namespace_id(const std::string& prefix) const;
@@ -43,7 +45,10 @@ protected:
     explicit c_xml_local(const c_xml_local* outer)
         : parent_(outer)
         , active_(outer->active_)
-        , is_changed_(outer->is_changed_) {}
+        , is_changed_(outer->is_changed_)
+        , index_(outer->index_) {
+        if (index_ != nullptr) enter_index();
+    }
 
     bool has_declarations() const { return !prefixes_.empty(); }
     void set_change_flag(bool* flag) { is_changed_ = flag; }
@@ -52,12 +57,21 @@ protected:
     }
 
 private:
+    void become_active();
+    void drop_declarations();
+    void enter_index();
+    void leave_index();
+
     const c_xml_local* parent_ = nullptr;
     // The nearest scope, from this one outwards, that has ever had a declaration: the search starts there.
     const c_xml_local* active_ = nullptr;
+    // How many scopes a search from here walks through, once this one is active.
+    unsigned int scopes_to_walk_ = 0;
     // Raised whenever prefixes may have changed their meaning; belongs to the reader, null where nobody asks.
     bool* is_changed_ = nullptr;
     c_repository<int> prefixes_;
+    // Beside the walk, where that would be long.
+    std::shared_ptr<hqf::scope_index> index_;
 };
 
 } // namespace lmx

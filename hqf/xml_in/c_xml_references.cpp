@@ -3,7 +3,6 @@
 #include "hqf/xml_in/limits.h"
 #include "hqf/xml_in/name_chars.h"
 
-#include <algorithm>
 #include <string_view>
 
 // References to entities, XML 1.0, 4.1. In text an entity's value joins the input, markup and all; in attribute values
@@ -70,12 +69,12 @@ bool c_xml::insert_predefined(std::string* out) {
 }
 
 bool c_xml::expand_entity_value(const char* value, std::string* out) {
-    if (std::find(entities_in_place_.begin(), entities_in_place_.end(), value) != entities_in_place_.end()) {
+    if (entities_in_place_.holds(value)) {
         getter_.error(error_fatal, err_badly_formed_dtd, std::string("Recursive entity definition for: ") + value);
         return false;
     }
     if (entities_in_place_.size() >= hqf::limits::entity_depth || !getter_.pay_for_expansion(value)) return false;
-    entities_in_place_.push_back(value);
+    entities_in_place_.push(value);
     bool is_sound = true;
     for (const char* at = value; is_sound && *at != 0;) {
         const char c = *at++;
@@ -86,7 +85,7 @@ bool c_xml::expand_entity_value(const char* value, std::string* out) {
         c_entity_name_reader_for_entity reader(at, at);
         is_sound = insert_entity(reader, out);
     }
-    entities_in_place_.pop_back();
+    entities_in_place_.pop();
     return is_sound;
 }
 

@@ -85,6 +85,21 @@ TEST(hostile, entity_defined_anew_while_it_is_read) {
               "<a>[2]</a>.@1");
 }
 
+TEST(hostile, entities_defined_anew_deep_inside) {
+    constexpr int depth = 40;
+    std::string subset = "<!ENTITY % e0 \"";
+    for (int i = 0; i < depth; ++i) // for the reference itself, and then for the value that is being read
+        subset += "<!ENTITY &#37; e" + std::to_string(i) + " '<!ENTITY v" + std::to_string(i) + " &#34;new&#34;>'>";
+    subset += "\">";
+    for (int i = 1; i < depth; ++i)
+        subset += "<!ENTITY % e" + std::to_string(i) + " '&#37;e" + std::to_string(i - 1) + "; <!ENTITY w" +
+                  std::to_string(i) + " &#34;old&#34;>'>";
+    subset += " %e39; %e39; %e20; %e0; ";
+    EXPECT_EQ(run(tokens, "<!DOCTYPE a [" + subset + "]><a>&w1;&w16;&w17;&w39;&v39;&v20;&v0;</a>"),
+              "<a>[oldoldoldoldnewnewnew]</a>.@1")
+        << "each value is read to its end, and the next reference gives the new one";
+}
+
 TEST(hostile, elements_nested_deeply) {
     for (const std::size_t depth : {hqf::limits::skip_depth - 1, hqf::limits::skip_depth, 1000000u}) {
         const bool passes = depth < hqf::limits::skip_depth;

@@ -9,6 +9,8 @@
 
 #include <gtest/gtest.h>
 
+#include <list>
+
 namespace {
 
 using namespace xml_in_test;
@@ -132,6 +134,43 @@ TEST(reader, scopes_find_prefixes_and_numbers) {
     EXPECT_EQ(table.add_namespace("v"), 1701) << "new ones begin above";
     table.clear();
     EXPECT_EQ(table.add_namespace("v"), 1000);
+}
+
+// As many scopes as an index stands beside, and what a walk from scope to scope would find.
+TEST(reader, many_scopes_find_what_few_do) {
+    const auto id_in = [](const lmx::c_xml_local& scope, const char* prefix) {
+        return scope.find_namespace_id(prefix);
+    };
+    std::list<lmx::c_xml_local> chain(1);
+    for (int i = 0; i < 60; ++i) {
+        if (i != 0) chain.emplace_back(chain.back());
+        if (i % 4 == 3) continue; // a scope without declarations
+        chain.back().add_namespace("p", 2000 + i);
+        chain.back().add_namespace(("p" + std::to_string(i)).c_str(), 1000 + i);
+        chain.back().add_namespace(("p" + std::to_string(i)).c_str(), 3000 + i);
+    }
+    for (int i = 59; i >= 0; --i, chain.pop_back()) {
+        const lmx::c_xml_local& inner = chain.back();
+        EXPECT_EQ(id_in(inner, "p"), 2000 + (i % 4 == 3 ? i - 1 : i));
+        for (int j = 0; j < 60; ++j)
+            EXPECT_EQ(id_in(inner, ("p" + std::to_string(j)).c_str()), j > i || j % 4 == 3 ? 0 : 3000 + j) << i;
+        if (i == 40) {
+            chain.back().clear();
+            EXPECT_EQ(id_in(inner, "p"), 2038);
+            chain.back().add_namespace("q", 7);
+            EXPECT_TRUE(id_in(inner, "q") == 7 && id_in(inner, "p40") == 0) << "other declarations in the same scope";
+        }
+        if (i == 37) {
+            EXPECT_EQ(id_in(inner, "q"), 0) << "gone with its scope";
+            lmx::c_xml_local one(inner);
+            lmx::c_xml_local other(inner);
+            one.add_namespace("one", 8);
+            EXPECT_TRUE(id_in(one, "one") == 8 && id_in(other, "one") == 0) << "two scopes in the same one";
+            EXPECT_TRUE(id_in(inner, "one") == 0 && id_in(one, "p37") == 3037 && id_in(other, "p") == 2037);
+            chain.front().add_namespace("late", 9);
+            EXPECT_TRUE(id_in(other, "late") == 9 && id_in(one, "late") == 9) << "declared outside, after the fact";
+        }
+    }
 }
 
 // The value of the first element, the code, the event in between where asked for, and whether the element was empty.
