@@ -64,11 +64,6 @@ TEST(c_getter_error_binder, nests_and_puts_the_old_getter_back) {
     int places[3];
     const auto getter = [&](int i) { return reinterpret_cast<c_get_as_utf8*>(&places[i]); };
     c_error errors;
-    const auto bound_now = [&] {
-        c_getter_error_binder probe(errors);
-        probe.bind(getter(2));
-        return probe.get_old_getter();
-    };
     {
         c_getter_error_binder outer(errors);
         outer.bind(getter(0));
@@ -78,11 +73,14 @@ TEST(c_getter_error_binder, nests_and_puts_the_old_getter_back) {
             inner.bind(getter(0));
             EXPECT_TRUE(inner.get_new_getter() == getter(1) && inner.get_old_getter() == getter(0))
                 << "only the first bind acts";
-            EXPECT_EQ(bound_now(), getter(1));
         }
-        EXPECT_EQ(bound_now(), getter(0)) << "an unbound binder leaves the getter alone";
+        c_getter_error_binder probe(errors);
+        probe.bind(getter(2));
+        EXPECT_EQ(probe.get_old_getter(), getter(0)) << "the old getter is back, an unbound binder leaves it alone";
     }
-    EXPECT_EQ(bound_now(), nullptr);
+    c_getter_error_binder probe(errors);
+    probe.bind(getter(2));
+    EXPECT_EQ(probe.get_old_getter(), nullptr);
 }
 
 TEST(c_lmx_exception, carries_code_sentence_and_line) {
