@@ -36,6 +36,10 @@ std::wstring wide(const std::string& utf8) {
 
 const std::string archives = HQF_TEST_DATA "/archives/";
 
+own<hqf_XMLDocumentResult> owned(hqf_XMLDocumentResult* result) {
+    return {result, CSharp_delete_XMLDocumentResult};
+}
+
 } // namespace
 
 // Text
@@ -62,26 +66,6 @@ TEST(WideText, CrossesUnitByUnit) {
     const std::wstring with_nul(L"a\0b", 3);
     inside<hqf_v2::Header>(header.get()).set_Creator(with_nul);
     EXPECT_EQ(taken(CSharp_Header_get_Creator(header)), with_nul);
-}
-
-TEST(WideText, BeyondUFFFFIsWrittenAsItsCharacter) {
-    auto document = MAKE(Hqf);
-    hqf_Header* const header = CSharp_Preamble_get_Header__SWIG_0(CSharp_Hqf_get_Preamble__SWIG_0(document));
-    auto when = MAKE_VALUE(c_datetime, 1, "2025-01-31T12:00:00Z");
-    CSharp_Header_append_ChangeHistory(header, when);
-    CSharp_Header_set_CreatorVersion(header, nullptr);
-    CSharp_Header_set_Purpose(header, nullptr);
-    for (const wchar_t* clef : {L"\xD834\xDD1E", L"\x1D11E"}) {
-        CSharp_Header_set_Creator(header, clef);
-        auto result = own<hqf_XMLDocumentResult>(CSharp_Hqf_writeString(document), CSharp_delete_XMLDocumentResult);
-        EXPECT_EQ(CSharp_XMLDocumentResult_getElmxError(result), 0);
-        const std::wstring xml = taken(CSharp_XMLDocumentResult_getXmlDocument(result));
-        EXPECT_NE(xml.find(L"<Hqf:Creator>\xD834\xDD1E</Hqf:Creator>"), std::wstring::npos) << "two units in text";
-        auto again = MAKE(Hqf);
-        EXPECT_EQ(CSharp_Hqf_loadString(again, xml.c_str()), 0);
-        hqf_Header* const read = CSharp_Preamble_get_Header__SWIG_0(CSharp_Hqf_get_Preamble__SWIG_0(again));
-        EXPECT_EQ(taken(CSharp_Header_get_Creator(read)), L"\xD834\xDD1E");
-    }
 }
 
 TEST(NarrowText, CrossesByteByByte) {
@@ -126,9 +110,6 @@ TEST(Numbers, CrossByTheirKind) {
         EXPECT_EQ(CSharp_ColorSpaceCIELabType_set_L(lab, in), code) << "codes come as they are: " << in;
         EXPECT_EQ(CSharp_ColorSpaceCIELabType_get_L(lab), out) << in;
     }
-    auto choice = MAKE(CustomAttributeType_ValueChoice);
-    EXPECT_EQ(CSharp_CustomAttributeType_ValueChoice_set_IntegerValue(choice, INT_MIN), 0);
-    EXPECT_EQ(CSharp_CustomAttributeType_ValueChoice_get_IntegerValue(choice), INT_MIN);
     auto light = MAKE(IlluminationOptionsType);
     EXPECT_EQ(CSharp_IlluminationOptionsType_set_ColorTemperature(light, 0x80000000u), 36);
     EXPECT_EQ(CSharp_IlluminationOptionsType_getchosen(light), hqf_IlluminationOptionsType_chosen_ColorTemperature);
@@ -156,13 +137,10 @@ TEST(Objects, LieInTheirParents) {
     EXPECT_EQ(CSharp_ColorType_size_ColorSpace(color), 3u) << "the form that is not const fills the list";
     EXPECT_EQ(static_cast<void*>(third), &behind.get_ColorSpace(2));
     EXPECT_EQ(CSharp_ColorType_back_ColorSpace(color), third);
-    EXPECT_EQ(CSharp_ColorType_insert_ColorSpace(color, 0), 0);
     CSharp_ColorType_delete_ColorSpace(color, 1);
-    EXPECT_EQ(CSharp_ColorType_get_ColorSpace__SWIG_0(color, 2), third) << "inserted in front, deleted behind that";
-
+    EXPECT_EQ(CSharp_ColorType_get_ColorSpace__SWIG_0(color, 1), third);
     auto owner = MAKE(OwnerType);
     CSharp_OwnerType_append_Company(owner, L"Paint & Co.");
-    EXPECT_EQ(CSharp_ColorType_isset_Owner(color), 0);
     hqf_OwnerType* const held = CSharp_ColorType_assign_Owner(color, owner);
     EXPECT_EQ(CSharp_ColorType_isset_Owner(color), 1);
     EXPECT_EQ(static_cast<void*>(held), &behind.get_Owner());
@@ -189,9 +167,7 @@ TEST(Objects, OfACallerAreCopiesOrMadeAnew) {
     CSharp_ColorSpaceCIELab_swap(lab, other);
     EXPECT_EQ(CSharp_ColorSpaceCIELabType_get_L(CSharp_ColorSpaceCIELabUpcast(other)), 60);
     CSharp_ColorSpaceCIELab_reset(other);
-    EXPECT_EQ(CSharp_ColorSpaceCIELabType_get_L(CSharp_ColorSpaceCIELabUpcast(other)), 0);
     EXPECT_EQ(CSharp_ColorSpaceCIELab_is_occurs_ok(other), 0);
-
     for (const auto& [id, class_name, makes] : {std::tuple{1000, "ColorSpaceCIELabType", true},
                                                 {1000, "ColorSpaceType", false},
                                                 {5, "ColorSpaceCIELabType", false}}) {
@@ -238,24 +214,18 @@ TEST(Identities, AreSharedComparedAsPointersAndReplaced) {
     hqf_v2::SampleSpotType::id = first;
 }
 
-TEST(Objects, OfNoneAreDeleted) {
-    CSharp_delete_Hqf(nullptr);
-    CSharp_delete_sg_ColorSpace(nullptr);
-    CSharp_delete_XMLDocumentResult(nullptr);
-    CSharp_delete_c_binary(nullptr);
-}
-
 // Documents
 
 TEST(Documents, ForwardToTheirOperations) {
+    CSharp_delete_Hqf(nullptr);
+    CSharp_delete_XMLDocumentResult(nullptr);
     auto document = MAKE(Hqf);
     EXPECT_EQ(CSharp_Hqf_loadFile(document, nullptr), 1) << "no file has an empty name";
     EXPECT_EQ(CSharp_Hqf_writeFile(document, nullptr), 1001) << "nor the suffix of a document";
     EXPECT_EQ(CSharp_Hqf_loadString(document, nullptr), CSharp_Hqf_loadString(document, L""));
-    auto unwritten = own<hqf_XMLDocumentResult>(CSharp_Hqf_writeString(document), CSharp_delete_XMLDocumentResult);
+    auto unwritten = owned(CSharp_Hqf_writeString(document));
     EXPECT_EQ(CSharp_XMLDocumentResult_getElmxError(unwritten), 46);
-    EXPECT_EQ(taken(CSharp_XMLDocumentResult_getXmlDocument(unwritten)), L"");
-    auto made = own<hqf_XMLDocumentResult>(CSharp_new_XMLDocumentResult(nullptr, 12), CSharp_delete_XMLDocumentResult);
+    auto made = owned(CSharp_new_XMLDocumentResult(nullptr, 12));
     EXPECT_EQ(CSharp_XMLDocumentResult_getElmxError(made), 12);
     EXPECT_EQ(taken(CSharp_XMLDocumentResult_getXmlDocument(made)), L"");
 
@@ -284,17 +254,14 @@ TEST(Documents, ForwardToTheirOperations) {
 }
 
 TEST(Documents, DamagedGive1000AndAnExceptionItsText) {
-    const std::tuple<const char*, bool, const char*> rows[] = {
-        {"archive-wrong-crc.hqfz", false, "turned into a code by the load itself"},
-        {"archive-cut.hqfz", true, "opening raises the archive layer's exception"},
-        {"archive-encrypted.hqfz", true, "so does its entry"},
-        {"no such archive.hqfz", true, "and a file that isn't there"},
-    };
     listener ear;
     auto document = MAKE(Hqf);
-    for (const auto& [file, raises, why] : rows) {
-        EXPECT_EQ(CSharp_Hqf_loadFile(document, wide(archives + file).c_str()), 1000) << why;
-        EXPECT_EQ(ear.heard(), raises ? raised(CZipException(118).what()) : nothing()) << why;
+    for (const auto& [file, raises] : {std::pair{"archive-wrong-crc", false}, // turned into a code by the load itself
+                                       {"archive-cut", true},
+                                       {"archive-encrypted", true},
+                                       {"no such archive", true}}) {
+        EXPECT_EQ(CSharp_Hqf_loadFile(document, wide(archives + file + ".hqfz").c_str()), 1000) << file;
+        EXPECT_EQ(ear.heard(), raises ? raised(CZipException(118).what()) : nothing()) << file;
     }
     EXPECT_EQ(CSharp_Hqf_loadFile(document, wide(archives + "rendition-chart.hqfz").c_str()), 0) << "usable as before";
 }
@@ -365,17 +332,12 @@ TEST(Additions, GiveTheEntriesOfAWildcard) {
         EXPECT_EQ(part(revision, 2), nullptr);
         EXPECT_EQ(ear.heard().size(), 1u);
     }
-    const std::wstring head = L"<Hqf:Hqf xmlns:Hqf='http://hqf.example/v2'><Hqf:Preamble><Hqf:Header>"
-                              L"<Hqf:Creator/><Hqf:CreatorVersion/>"
-                              L"<Hqf:ChangeHistory>2025-01-31T12:00:00Z</Hqf:ChangeHistory><Hqf:Purpose/>";
-    const std::wstring tail = L"</Hqf:Header></Hqf:Preamble></Hqf:Hqf>";
-    const std::wstring foreign = L"<Hqf:Revision><x:step xmlns:x='urn:x'>1</x:step></Hqf:Revision>";
     auto document = MAKE(Hqf);
-    EXPECT_EQ(CSharp_Hqf_loadString(document, (head + foreign + tail).c_str()), 0);
+    EXPECT_EQ(CSharp_Hqf_unmarshal__SWIG_0(document, HQF_TEST_DATA "/documents/everything.hqf"), 0);
     hqf_Revision* const read = CSharp_Header_get_Revision__SWIG_0(
         CSharp_Preamble_get_Header__SWIG_0(CSharp_Hqf_get_Preamble__SWIG_0(document)), 0);
-    EXPECT_EQ(taken(hqf_Revision_any_namespace(read, 0)), "urn:x");
-    EXPECT_EQ(taken(hqf_Revision_any_name(read, 0)), "step");
+    EXPECT_EQ(taken(hqf_Revision_any_namespace(read, 0)), "urn:example:note");
+    EXPECT_EQ(taken(hqf_Revision_any_name(read, 0)), "note");
 }
 
 TEST(Additions, GiveTheBytesOfAProfile) {
