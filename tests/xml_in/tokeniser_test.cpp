@@ -30,7 +30,7 @@ TEST(tokeniser, passes_comments_and_instructions_over) {
     given{tokens}.everywhere(
         {is("<!-- a -- b > -> --><!--->--><a><!----></a>", "<a></a>.@1", "hyphens in the middle, one too few to end"),
          is("<!-- a --->\n<a/>", "<a/>.@2 {2 8 End of comment not Well-Formed}", "one hyphen too many is a warning"),
-         is("<?x?><?y a > b ?\?><?\?><?xm?><a/>", "<a/>.@1", "instructions end at their own ?>, whatever the target")});
+         is("<?x?><?y a > b ?\?><?\?><?xm?><a/>", "<a/>.@1", "instructions end at their own ?>")});
     given{tokens}.everywhere(rows("!@1", {"<!-- a", "<!-- a --", "<?x >", "<!DOCTYP x>"}));
 }
 
@@ -86,7 +86,6 @@ TEST(tokeniser, finds_attributes_out_of_order) {
 TEST(value, keeps_replaces_or_collapses_white_space) {
     const std::string rows[][5] = {
         // text, preserved, replaced, collapsed
-        {"  a  b  ", "  a  b  ", "  a  b  ", "a b", "blanks"},
         {"\ta\r\n\vb\f", "\ta\n\vb\f", " a  b ", "a b", "each character from tab to carriage return"},
         {" \t ", " \t ", "   ", "", "nothing else"},
         {"a &lt; b", "a < b", "a < b", "a < b", "a predefined reference keeps the blanks around it"},
