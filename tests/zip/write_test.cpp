@@ -13,6 +13,10 @@ namespace {
 
 const auto path = folder() / "written.zip";
 
+struct new_archive : CZipArchive {
+    new_archive() { Open(wide(path), CZipStorage::create); }
+};
+
 CZipFileHeader named(const std::wstring& name) {
     CZipFileHeader header;
     header.SetFileName(name);
@@ -20,9 +24,8 @@ CZipFileHeader named(const std::wstring& name) {
 }
 
 void add(CZipArchive& zip, const std::wstring& name, const std::string& content, int level = -1) {
-    ASSERT_TRUE(zip.OpenNewFile(named(name), level));
-    ASSERT_TRUE(zip.WriteNewFile(content.data(), static_cast<unsigned int>(content.size())));
-    ASSERT_TRUE(zip.CloseNewFile());
+    const auto size = static_cast<unsigned int>(content.size());
+    ASSERT_TRUE(zip.OpenNewFile(named(name), level) && zip.WriteNewFile(content.data(), size) && zip.CloseNewFile());
 }
 
 /// All entries of the archive, with a bar behind each.
@@ -43,15 +46,14 @@ std::string contents() {
 } // namespace
 
 TEST(zip_write, a_packed_file_has_exactly_this_shape) {
-    std::tm local{};
-    local.tm_year = 124, local.tm_mon = 4, local.tm_mday = 1, local.tm_hour = 9, local.tm_isdst = -1;
+    std::tm local{0, 0, 9, 1, 4, 124, 0, 0, -1, 0, nullptr};
+    const std::time_t begin = std::mktime(&local);
     std::filesystem::create_directories(folder() / "dir");
     const auto source = folder() / "dir" / "a.hqf";
     for (const std::string& content : {std::string("1234"), std::string("12345"), sample_text(200000)}) {
         put(source, content);
-        ASSERT_TRUE(hqf::set_file_time(wide(source), std::mktime(&local) + 1));
-        CZipArchive zip;
-        ASSERT_TRUE(zip.Open(wide(path), CZipStorage::create));
+        ASSERT_TRUE(hqf::set_file_time(wide(source), begin + 1));
+        new_archive zip;
         ASSERT_TRUE(zip.AddNewFile(wide(source), -1, false, 7, 65536));
         zip.Close();
         const entry expected(content, content.size() < 5 ? 0 : 8);
@@ -64,8 +66,7 @@ TEST(zip_write, levels_choose_method_and_flags) {
                                               {8, 8, 2},  {9, 8, 2}, {10, 8, 0}, {-2, 8, 0}};
     const std::string text = sample_text(50000);
     for (const auto& [level, method, flags] : rows) {
-        CZipArchive zip;
-        zip.Open(wide(path), CZipStorage::create);
+        new_archive zip;
         add(zip, L"a", text, level);
         const CZipFileHeader& header = *zip.GetFileInfo(0);
         EXPECT_TRUE(header.GetMethod() == method && header.GetFlags() == flags) << level;
@@ -108,8 +109,7 @@ TEST(zip_write, names_of_entries_come_from_the_path) {
                                                                 {L"//", false, "sub/"},
                                                                 {L"/", true, full + "/"}};
     for (const auto& [behind, full_path, name] : rows) {
-        CZipArchive zip;
-        zip.Open(wide(path), CZipStorage::create);
+        new_archive zip;
         ASSERT_TRUE(zip.AddNewFile(wide(dir) + behind, -1, full_path));
         const CZipFileHeader& header = *zip.GetFileInfo(0);
         const bool is_folder = name.back() == '/';
@@ -131,8 +131,7 @@ TEST(zip_write, fields_of_65536_bytes_are_refused_and_leave_no_entry) {
         header.SetComment(std::wstring(comment, L'c'));
         if (local != 0) header.GetLocalExtra().Add(1, bytes65532.data(), local);
         if (central != 0) header.GetCentralExtra().Add(1, bytes65532.data(), central);
-        CZipArchive zip;
-        zip.Open(wide(path), CZipStorage::create);
+        new_archive zip;
         EXPECT_EQ(cause_of([&] { zip.OpenNewFile(header, 0) && zip.CloseNewFile(); }), cause);
         zip.Close();
         EXPECT_EQ(contents(), cause == 0 ? "|" : "") << name << comment << local << central;
@@ -150,8 +149,7 @@ TEST(zip_write, record_of_names_is_written_only_where_it_says_something) {
         header.SetNameCodePage(name_page);
         header.SetCommentCodePage(comment_page);
         header.SetNameInExtra(in_extra);
-        CZipArchive zip;
-        zip.Open(wide(path), CZipStorage::create);
+        new_archive zip;
         ASSERT_TRUE(zip.OpenNewFile(header) && zip.CloseNewFile());
         zip.Close();
         zip.Open(wide(path), CZipStorage::openReadOnly);
@@ -194,16 +192,13 @@ TEST(zip_write, adds_behind_what_is_there) {
 
 TEST(zip_write, an_exception_leaves_no_directory_and_a_dropped_entry_no_trace) {
     for (bool closes : {true, false}) {
-        CZipArchive zip;
-        zip.Open(wide(path), CZipStorage::create);
+        new_archive zip;
         add(zip, L"a", "abc");
         zip.OpenNewFile(named(L"b"));
-        zip.WriteNewFile("abc", 3);
         if (closes) zip.Close(CZipArchive::closeAfterException);
     }
     EXPECT_EQ(load(path).cause, 118) << "a destructor writes nothing";
-    CZipArchive zip;
-    zip.Open(wide(path), CZipStorage::create);
+    new_archive zip;
     add(zip, L"a", "kept");
     zip.OpenNewFile(named(L"b"));
     zip.WriteNewFile("dropped", 7);
@@ -214,8 +209,7 @@ TEST(zip_write, an_exception_leaves_no_directory_and_a_dropped_entry_no_trace) {
 }
 
 TEST(zip_write, holds_65535_entries_and_no_more) {
-    CZipArchive zip;
-    zip.Open(wide(path), CZipStorage::create);
+    new_archive zip;
     CZipFileHeader header = named(L"n");
     header.SetTime(1714554000);
     for (int i = 0; i < 65535; ++i)
@@ -227,8 +221,7 @@ TEST(zip_write, holds_65535_entries_and_no_more) {
 }
 
 TEST(zip_write, time_without_a_source_is_now_and_close_can_stamp_the_file) {
-    CZipArchive zip;
-    zip.Open(wide(path), CZipStorage::create);
+    new_archive zip;
     CZipFileHeader old = named(L"old");
     old.SetTime(1000000000);
     ASSERT_TRUE(zip.OpenNewFile(old) && zip.CloseNewFile());
