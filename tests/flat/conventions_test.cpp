@@ -23,25 +23,6 @@ using namespace flat_test;
 
 namespace {
 
-/// An object that an export gave, deleted by the export of its class.
-template<class T>
-class owned {
-public:
-    owned(T* object, void (*end)(T*))
-        : object_(object)
-        , end_(end) {}
-    ~owned() { end_(object_); }
-    owned(const owned&) = delete;
-    owned& operator=(const owned&) = delete;
-    operator T*() const { return object_; }
-    T* get() const { return object_; }
-
-private:
-    T* object_;
-    void (*end_)(T*);
-};
-#define MAKE(cls) owned<hqf_##cls>(CSharp_new_##cls##__SWIG_0(), CSharp_delete_##cls)
-
 /// The object behind an opaque pointer.
 template<class T>
 T& inside(void* object) {
@@ -55,20 +36,19 @@ std::wstring wide(const std::string& utf8) {
 
 const std::string archives = HQF_TEST_DATA "/archives/";
 
+own<hqf_XMLDocumentResult> owned(hqf_XMLDocumentResult* result) {
+    return {result, CSharp_delete_XMLDocumentResult};
+}
+
 } // namespace
 
 // Text
 
 TEST(WideText, CrossesUnitByUnit) {
-    const struct {
-        const wchar_t* in;
-        std::wstring out;
-        const char* why;
-    } rows[] = {
-        {L"abc", L"abc", "plain"},
+    const std::tuple<const wchar_t*, std::wstring, const char*> rows[] = {
         {L"", L"", "empty"},
         {nullptr, L"", "null is the empty string"},
-        {L"\u00FF\u0100\uFFFF", L"\u00FF\u0100\uFFFF", "units above 0xFF"},
+        {L"z\u00FF\u0100\uFFFF", L"z\u00FF\u0100\uFFFF", "plain, and units above 0xFF"},
         {L"\xD834\xDD1E", L"\xD834\xDD1E", "a surrogate pair stays two units"},
         {L"a\xD834", L"a\xD834", "a lone high surrogate"},
         {L"\xDD1Ez", L"\xDD1Ez", "a lone low surrogate"},
@@ -76,45 +56,21 @@ TEST(WideText, CrossesUnitByUnit) {
     };
     listener ear;
     auto header = MAKE(Header);
-    for (const auto& row : rows) {
-        EXPECT_EQ(CSharp_Header_set_Creator(header, row.in), 0) << row.why;
+    for (const auto& [in, out, why] : rows) {
+        EXPECT_EQ(CSharp_Header_set_Creator(header, in), 0) << why;
         wchar_t* const text = CSharp_Header_get_Creator(header);
-        EXPECT_EQ(SysStringByteLen(text), row.out.size() * sizeof(wchar_t)) << row.why;
-        EXPECT_EQ(taken(text), row.out) << row.why;
+        EXPECT_EQ(SysStringLen(text), out.size()) << why;
+        EXPECT_EQ(taken(text), out) << why;
     }
     EXPECT_EQ(ear.heard(), nothing());
-}
-
-TEST(WideText, GoesOutWithItsEmbeddedNul) {
-    auto header = MAKE(Header);
-    const std::wstring text(L"a\0b", 3);
-    inside<hqf_v2::Header>(header.get()).set_Creator(text);
-    EXPECT_EQ(taken(CSharp_Header_get_Creator(header)), text);
-}
-
-TEST(WideText, BeyondUFFFFIsWrittenAsItsCharacter) {
-    auto document = MAKE(Hqf);
-    hqf_Header* const header = CSharp_Preamble_get_Header__SWIG_0(CSharp_Hqf_get_Preamble__SWIG_0(document));
-    auto when = owned<lmx_c_datetime>(CSharp_new_c_datetime__SWIG_1("2025-01-31T12:00:00Z"), CSharp_delete_c_datetime);
-    CSharp_Header_append_ChangeHistory(header, when);
-    CSharp_Header_set_CreatorVersion(header, nullptr);
-    CSharp_Header_set_Purpose(header, nullptr);
-    for (const wchar_t* clef : {L"\xD834\xDD1E", L"\x1D11E"}) {
-        CSharp_Header_set_Creator(header, clef);
-        auto result = owned<hqf_XMLDocumentResult>(CSharp_Hqf_writeString(document), CSharp_delete_XMLDocumentResult);
-        EXPECT_EQ(CSharp_XMLDocumentResult_getElmxError(result), 0);
-        const std::wstring xml = taken(CSharp_XMLDocumentResult_getXmlDocument(result));
-        EXPECT_NE(xml.find(L"<Hqf:Creator>\xD834\xDD1E</Hqf:Creator>"), std::wstring::npos) << "two units in text";
-        auto again = MAKE(Hqf);
-        EXPECT_EQ(CSharp_Hqf_loadString(again, xml.c_str()), 0);
-        hqf_Header* const read = CSharp_Preamble_get_Header__SWIG_0(CSharp_Hqf_get_Preamble__SWIG_0(again));
-        EXPECT_EQ(taken(CSharp_Header_get_Creator(read)), L"\xD834\xDD1E");
-    }
+    const std::wstring with_nul(L"a\0b", 3);
+    inside<hqf_v2::Header>(header.get()).set_Creator(with_nul);
+    EXPECT_EQ(taken(CSharp_Header_get_Creator(header)), with_nul);
 }
 
 TEST(NarrowText, CrossesByteByByte) {
-    auto info = owned<lmx_c_any_info>(CSharp_new_c_any_info__SWIG_0(), CSharp_delete_c_any_info);
-    for (const char* text : {"", "plain", "\xC3\xA9\xF0\x9D\x84\x9E", "\xFF no UTF-8"}) {
+    auto info = MAKE_VALUE(c_any_info, 0);
+    for (const char* text : {"", "\xC3\xA9\xF0\x9D\x84\x9E", "\xFF no UTF-8"}) {
         CSharp_c_any_info_set_name(info, text);
         EXPECT_EQ(taken(CSharp_c_any_info_get_name(info)), text);
     }
@@ -140,7 +96,7 @@ TEST(PlatformStrings, HaveTheirLengthInFrontAndZerosWithoutText) {
 
 TEST(Numbers, CrossByTheirKind) {
     auto averaging = MAKE(Averaging);
-    for (const auto& [in, out] : {std::pair{0, 0}, {1, 1}, {2, 1}, {-1, 1}, {0x100, 1}, {INT_MIN, 1}}) {
+    for (const auto& [in, out] : {std::pair{0, 0}, {2, 1}, {-1, 1}, {0x100, 1}}) {
         EXPECT_EQ(CSharp_Averaging_set_Averaging(averaging, in), 0);
         EXPECT_EQ(CSharp_Averaging_get_Averaging(averaging), out) << "anything but 0 is true: " << in;
     }
@@ -154,9 +110,6 @@ TEST(Numbers, CrossByTheirKind) {
         EXPECT_EQ(CSharp_ColorSpaceCIELabType_set_L(lab, in), code) << "codes come as they are: " << in;
         EXPECT_EQ(CSharp_ColorSpaceCIELabType_get_L(lab), out) << in;
     }
-    auto choice = MAKE(CustomAttributeType_ValueChoice);
-    EXPECT_EQ(CSharp_CustomAttributeType_ValueChoice_set_IntegerValue(choice, INT_MIN), 0);
-    EXPECT_EQ(CSharp_CustomAttributeType_ValueChoice_get_IntegerValue(choice), INT_MIN);
     auto light = MAKE(IlluminationOptionsType);
     EXPECT_EQ(CSharp_IlluminationOptionsType_set_ColorTemperature(light, 0x80000000u), 36);
     EXPECT_EQ(CSharp_IlluminationOptionsType_getchosen(light), hqf_IlluminationOptionsType_chosen_ColorTemperature);
@@ -164,12 +117,10 @@ TEST(Numbers, CrossByTheirKind) {
 
 TEST(Enumerations, TakeNumbersOfLiteralsAlone) {
     auto value = MAKE(FloatingPointValueType);
-    const struct {
-        int number, result, stored;
-    } rows[] = {{2, 1, 2}, {0, 0, 2}, {4, 0, 2}, {-1, 0, 2}, {INT_MAX, 0, 2}, {INT_MIN, 0, 2}, {3, 1, 3}};
-    for (const auto& row : rows) {
-        EXPECT_EQ(CSharp_FloatingPointValueType_setenum_AxisNominalScale(value, row.number), row.result) << row.number;
-        EXPECT_EQ(CSharp_FloatingPointValueType_getenum_AxisNominalScale(value), row.stored) << row.number;
+    for (const auto& [number, result, stored] :
+         {std::tuple{2, 1, 2}, {0, 0, 2}, {4, 0, 2}, {INT_MIN, 0, 2}, {3, 1, 3}}) {
+        EXPECT_EQ(CSharp_FloatingPointValueType_setenum_AxisNominalScale(value, number), result) << number;
+        EXPECT_EQ(CSharp_FloatingPointValueType_getenum_AxisNominalScale(value), stored) << number;
     }
     EXPECT_EQ(taken(CSharp_FloatingPointValueType_get_AxisNominalScale(value)), L"Scale_Other");
     CSharp_FloatingPointValueType_unset_AxisNominalScale(value);
@@ -186,19 +137,16 @@ TEST(Objects, LieInTheirParents) {
     EXPECT_EQ(CSharp_ColorType_size_ColorSpace(color), 3u) << "the form that is not const fills the list";
     EXPECT_EQ(static_cast<void*>(third), &behind.get_ColorSpace(2));
     EXPECT_EQ(CSharp_ColorType_back_ColorSpace(color), third);
-    EXPECT_EQ(CSharp_ColorType_insert_ColorSpace(color, 0), 0);
     CSharp_ColorType_delete_ColorSpace(color, 1);
-    EXPECT_EQ(CSharp_ColorType_get_ColorSpace__SWIG_0(color, 2), third) << "inserted in front, deleted behind that";
-
+    EXPECT_EQ(CSharp_ColorType_get_ColorSpace__SWIG_0(color, 1), third);
     auto owner = MAKE(OwnerType);
     CSharp_OwnerType_append_Company(owner, L"Paint & Co.");
-    EXPECT_EQ(CSharp_ColorType_isset_Owner(color), 0);
     hqf_OwnerType* const held = CSharp_ColorType_assign_Owner(color, owner);
     EXPECT_EQ(CSharp_ColorType_isset_Owner(color), 1);
     EXPECT_EQ(static_cast<void*>(held), &behind.get_Owner());
     EXPECT_EQ(taken(CSharp_OwnerType_get_Company(held, 0)), L"Paint & Co.");
 
-    auto when = owned<lmx_c_datetime>(CSharp_new_c_datetime__SWIG_1("2025-01-31T12:00:00Z"), CSharp_delete_c_datetime);
+    auto when = MAKE_VALUE(c_datetime, 1, "2025-01-31T12:00:00Z");
     EXPECT_EQ(CSharp_ColorType_append_ChangeHistory(color, when), 0);
     CSharp_c_datetime_set_year(when, 1999);
     lmx_c_datetime* const entry = CSharp_ColorType_get_ChangeHistory(color, 0);
@@ -211,7 +159,7 @@ TEST(Objects, OfACallerAreCopiesOrMadeAnew) {
     hqf_ColorSpaceCIELabType* const type = CSharp_ColorSpaceCIELabUpcast(lab);
     EXPECT_EQ(static_cast<void*>(type), static_cast<void*>(lab.get()));
     CSharp_ColorSpaceCIELabType_set_L(type, 50);
-    auto copy = owned<hqf_ColorSpaceCIELabType>(CSharp_ColorSpaceCIELab_clone(lab), CSharp_delete_ColorSpaceCIELabType);
+    auto copy = own<hqf_ColorSpaceCIELabType>(CSharp_ColorSpaceCIELab_clone(lab), CSharp_delete_ColorSpaceCIELabType);
     CSharp_ColorSpaceCIELabType_set_L(type, 60);
     EXPECT_EQ(CSharp_ColorSpaceCIELabType_get_L(copy), 50);
 
@@ -219,21 +167,14 @@ TEST(Objects, OfACallerAreCopiesOrMadeAnew) {
     CSharp_ColorSpaceCIELab_swap(lab, other);
     EXPECT_EQ(CSharp_ColorSpaceCIELabType_get_L(CSharp_ColorSpaceCIELabUpcast(other)), 60);
     CSharp_ColorSpaceCIELab_reset(other);
-    EXPECT_EQ(CSharp_ColorSpaceCIELabType_get_L(CSharp_ColorSpaceCIELabUpcast(other)), 0);
     EXPECT_EQ(CSharp_ColorSpaceCIELab_is_occurs_ok(other), 0);
-
-    const struct {
-        int id;
-        const char* name;
-        bool makes;
-    } rows[] = {
-        {1000, "ColorSpaceCIELabType", true}, {1000, "ColorSpaceType", false}, {5, "ColorSpaceCIELabType", false}};
-    for (const auto& row : rows) {
+    for (const auto& [id, class_name, makes] : {std::tuple{1000, "ColorSpaceCIELabType", true},
+                                                {1000, "ColorSpaceType", false},
+                                                {5, "ColorSpaceCIELabType", false}}) {
         auto made =
-            owned<hqf_ColorSpaceType>(CSharp_ColorSpaceType_factory(row.id, row.name), CSharp_delete_ColorSpaceType);
-        const bool is_lab =
-            made != nullptr && CSharp_ColorSpaceType_getid(made) == CSharp_ColorSpaceCIELabType_id_get();
-        EXPECT_EQ(is_lab, row.makes) << row.id << ' ' << row.name;
+            own<hqf_ColorSpaceType>(CSharp_ColorSpaceType_factory(id, class_name), CSharp_delete_ColorSpaceType);
+        EXPECT_EQ(made != nullptr && CSharp_ColorSpaceType_getid(made) == CSharp_ColorSpaceCIELabType_id_get(), makes)
+            << id << ' ' << class_name;
     }
 }
 
@@ -273,26 +214,18 @@ TEST(Identities, AreSharedComparedAsPointersAndReplaced) {
     hqf_v2::SampleSpotType::id = first;
 }
 
-TEST(Objects, OfNoneAreDeleted) {
-    CSharp_delete_Hqf(nullptr);
-    CSharp_delete_sg_ColorSpace(nullptr);
-    CSharp_delete_XMLDocumentResult(nullptr);
-    CSharp_delete_c_binary(nullptr);
-    CSharp_delete_c_datetime_base(nullptr);
-}
-
 // Documents
 
 TEST(Documents, ForwardToTheirOperations) {
+    CSharp_delete_Hqf(nullptr);
+    CSharp_delete_XMLDocumentResult(nullptr);
     auto document = MAKE(Hqf);
     EXPECT_EQ(CSharp_Hqf_loadFile(document, nullptr), 1) << "no file has an empty name";
     EXPECT_EQ(CSharp_Hqf_writeFile(document, nullptr), 1001) << "nor the suffix of a document";
     EXPECT_EQ(CSharp_Hqf_loadString(document, nullptr), CSharp_Hqf_loadString(document, L""));
-    auto unwritten = owned<hqf_XMLDocumentResult>(CSharp_Hqf_writeString(document), CSharp_delete_XMLDocumentResult);
+    auto unwritten = owned(CSharp_Hqf_writeString(document));
     EXPECT_EQ(CSharp_XMLDocumentResult_getElmxError(unwritten), 46);
-    EXPECT_EQ(taken(CSharp_XMLDocumentResult_getXmlDocument(unwritten)), L"");
-    auto made =
-        owned<hqf_XMLDocumentResult>(CSharp_new_XMLDocumentResult(nullptr, 12), CSharp_delete_XMLDocumentResult);
+    auto made = owned(CSharp_new_XMLDocumentResult(nullptr, 12));
     EXPECT_EQ(CSharp_XMLDocumentResult_getElmxError(made), 12);
     EXPECT_EQ(taken(CSharp_XMLDocumentResult_getXmlDocument(made)), L"");
 
@@ -321,21 +254,14 @@ TEST(Documents, ForwardToTheirOperations) {
 }
 
 TEST(Documents, DamagedGive1000AndAnExceptionItsText) {
-    const struct {
-        const char* name;
-        bool raises;
-        const char* why;
-    } rows[] = {
-        {"archive-wrong-crc.hqfz", false, "turned into a code by the load itself"},
-        {"archive-cut.hqfz", true, "opening raises the archive layer's exception"},
-        {"archive-encrypted.hqfz", true, "so does its entry"},
-        {"no such archive.hqfz", true, "and a file that isn't there"},
-    };
     listener ear;
     auto document = MAKE(Hqf);
-    for (const auto& row : rows) {
-        EXPECT_EQ(CSharp_Hqf_loadFile(document, wide(archives + row.name).c_str()), 1000) << row.why;
-        EXPECT_EQ(ear.heard(), row.raises ? raised(CZipException(118).what()) : nothing()) << row.why;
+    for (const auto& [file, raises] : {std::pair{"archive-wrong-crc", false}, // turned into a code by the load itself
+                                       {"archive-cut", true},
+                                       {"archive-encrypted", true},
+                                       {"no such archive", true}}) {
+        EXPECT_EQ(CSharp_Hqf_loadFile(document, wide(archives + file + ".hqfz").c_str()), 1000) << file;
+        EXPECT_EQ(ear.heard(), raises ? raised(CZipException(118).what()) : nothing()) << file;
     }
     EXPECT_EQ(CSharp_Hqf_loadFile(document, wide(archives + "rendition-chart.hqfz").c_str()), 0) << "usable as before";
 }
@@ -346,18 +272,24 @@ TEST(Exceptions, EndAtTheExport) {
     using hqf::flat::call;
     listener ear;
     EXPECT_EQ(call(+[]() -> lmx::elmx_error { throw CZipException(102); }), 1000);
-    EXPECT_EQ(ear.heard(), raised(CZipException(102).what()));
     EXPECT_EQ(call(+[]() -> lmx::elmx_error { throw std::out_of_range("far"); }), 42);
-    EXPECT_EQ(ear.heard(), raised("far"));
     EXPECT_EQ(call(+[]() -> lmx::elmx_error { throw lmx::c_lmx_exception(lmx::err_no_error); }), 42) << "never 0";
-    EXPECT_EQ(ear.heard(), raised("No Error"));
-    EXPECT_EQ(call(+[]() -> lmx::elmx_error { throw 7; }), 42);
-    EXPECT_EQ(ear.heard().size(), 1u) << "an exception without a text";
+    const calls told = ear.heard();
+    EXPECT_EQ(told, (calls{raised(CZipException(102).what())[0], raised("far")[0], raised("No Error")[0]}));
+    EXPECT_EQ(call(+[]() -> lmx::elmx_error { throw 7; }), 42) << "an exception without a text";
     EXPECT_EQ(call(+[]() -> bool { throw std::out_of_range("far"); }), 0);
     EXPECT_EQ(call(+[]() -> double { throw std::out_of_range("far"); }), 0.0);
     EXPECT_EQ(call(+[]() -> const std::wstring& { throw std::out_of_range("far"); }), nullptr);
     call(+[]() -> void { throw std::out_of_range("far"); });
-    EXPECT_EQ(ear.heard().size(), 4u);
+    EXPECT_EQ(ear.heard().size(), 5u);
+    SWIGRegisterExceptionArgumentCallbacks_HqfModule(
+        nullptr,
+        [](const char*, const char*) {
+            messages.push_back({"the last registered", 1, ""});
+        },
+        nullptr);
+    CSharp_length(nullptr);
+    EXPECT_EQ(ear.heard(), (calls{{"the last registered", 1, ""}}));
 }
 
 TEST(Exceptions, OfMemoryEndAtTheExport) {
@@ -383,17 +315,6 @@ TEST(Exceptions, WithoutCallbacksGiveTheSameResults) {
     EXPECT_EQ(CSharp_Hqf_loadFile(document, L"no such archive.hqfz"), 1000);
 }
 
-TEST(Callbacks, AreTheLastRegistered) {
-    static int calls;
-    calls = 0;
-    listener ear;
-    SWIGRegisterExceptionArgumentCallbacks_HqfModule(
-        nullptr, [](const char*, const char*) { ++calls; }, nullptr);
-    CSharp_length(nullptr);
-    EXPECT_EQ(calls, 1);
-    EXPECT_EQ(ear.heard(), nothing());
-}
-
 // What we add
 
 TEST(Additions, GiveTheEntriesOfAWildcard) {
@@ -411,22 +332,17 @@ TEST(Additions, GiveTheEntriesOfAWildcard) {
         EXPECT_EQ(part(revision, 2), nullptr);
         EXPECT_EQ(ear.heard().size(), 1u);
     }
-    const std::wstring head = L"<Hqf:Hqf xmlns:Hqf='http://hqf.example/v2'><Hqf:Preamble><Hqf:Header>"
-                              L"<Hqf:Creator/><Hqf:CreatorVersion/>"
-                              L"<Hqf:ChangeHistory>2025-01-31T12:00:00Z</Hqf:ChangeHistory><Hqf:Purpose/>";
-    const std::wstring tail = L"</Hqf:Header></Hqf:Preamble></Hqf:Hqf>";
-    const std::wstring foreign = L"<Hqf:Revision><x:step xmlns:x='urn:x'>1</x:step></Hqf:Revision>";
     auto document = MAKE(Hqf);
-    EXPECT_EQ(CSharp_Hqf_loadString(document, (head + foreign + tail).c_str()), 0);
+    EXPECT_EQ(CSharp_Hqf_unmarshal__SWIG_0(document, HQF_TEST_DATA "/documents/everything.hqf"), 0);
     hqf_Revision* const read = CSharp_Header_get_Revision__SWIG_0(
         CSharp_Preamble_get_Header__SWIG_0(CSharp_Hqf_get_Preamble__SWIG_0(document)), 0);
-    EXPECT_EQ(taken(hqf_Revision_any_namespace(read, 0)), "urn:x");
-    EXPECT_EQ(taken(hqf_Revision_any_name(read, 0)), "step");
+    EXPECT_EQ(taken(hqf_Revision_any_namespace(read, 0)), "urn:example:note");
+    EXPECT_EQ(taken(hqf_Revision_any_name(read, 0)), "note");
 }
 
 TEST(Additions, GiveTheBytesOfAProfile) {
     const unsigned char bytes[] = {1, 0, 255};
-    auto value = owned<lmx_c_binary>(CSharp_new_c_binary__SWIG_2(bytes, 3), CSharp_delete_c_binary);
+    auto value = own<lmx_c_binary>(CSharp_new_c_binary__SWIG_2(bytes, 3), CSharp_delete_c_binary);
     auto profile = MAKE(ProfileFile);
     EXPECT_EQ(CSharp_ProfileFile_set_ProfileFile(profile, value), 0);
     lmx_c_binary* const held = CSharp_ProfileFile_get_ProfileFile(profile);

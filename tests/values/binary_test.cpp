@@ -38,9 +38,6 @@ TEST(c_binary, hex) {
         value.from_hex(text.c_str());
         EXPECT_EQ(hex_of(value), bytes) << text;
     }
-    c_binary value;
-    value.from_hex("0aF1");
-    EXPECT_EQ(bytes_of(value), "\x0A\xF1");
     std::ostringstream os;
     os << std::showbase << std::left << c_as_hex(from_bytes("\x0A\xFF")) << ' ' << std::setw(4) << 10;
     EXPECT_EQ(os.str(), "0AFF 1000") << "flags are put back, the fill stays";
@@ -48,9 +45,9 @@ TEST(c_binary, hex) {
 
 TEST(c_binary, base64) {
     for (const auto& [pattern, valid, bytes] : values_test::rows<3>(R"(
-        '' 1 ''   QUJD 1 414243   QUI= 1 4142   QQ== 1 41   +/+/ 1 FBFFBF   QU_JD 1 414243   __QUJD_ 1 414243
-        QQ=_ 1 41   QUI_= 1 4142   QQ=_= 0 41   A 0 00   = 0 ''   == 0 ''   _ 0 ''   QUJ 0 4142   Q=== 0 40
-        QUJD==== 0 414243   QQ=Q 0 4104   QU-D 0 4140)"))
+        '' 1 ''   QUJD 1 414243   QUI= 1 4142   QQ== 1 41   +/+/ 1 FBFFBF   __QU_JD_ 1 414243   QUI_= 1 4142
+        QQ=_= 0 41   A 0 00   = 0 ''   == 0 ''   _ 0 ''   QUJ 0 4142   Q=== 0 40   QUJD==== 0 414243   QQ=Q 0 4104
+        QU-D 0 4140)"))
         for (const char blank : {' ', '\n', '\t', '\r'}) {
             std::string text = pattern;
             std::replace(text.begin(), text.end(), ' ', blank);
@@ -79,15 +76,12 @@ TEST(c_binary, base64) {
 
 TEST(c_binary, holds_bytes) {
     c_binary value;
-    EXPECT_EQ(value.size(), 0u);
     value.append('a');
     (value += 'b') += 'c';
     value[1] = 'B';
-    EXPECT_TRUE(value == from_bytes("aBc") && value != from_bytes("aB"));
-    EXPECT_TRUE(value.equal(reinterpret_cast<const unsigned char*>("aBc"), 3));
-    EXPECT_FALSE(value.equal(reinterpret_cast<const unsigned char*>("aBcd"), 4));
+    EXPECT_TRUE(value == from_bytes("aBc") && value != from_bytes("aB") && !value.equal(nullptr, 0));
     EXPECT_TRUE(c_binary().equal(nullptr, 0) && c_binary(nullptr, 0) == c_binary());
-    unsigned char buffer[5] = {'x', 'x', 'x', 'x', 'x'};
+    unsigned char buffer[] = "xxxxx";
     EXPECT_EQ(value.get(buffer, 5), buffer);
     EXPECT_EQ(std::string(buffer, buffer + 5), "aBcxx") << "only the value's bytes";
     buffer[2] = 'x';
@@ -108,7 +102,6 @@ TEST(c_binary, holds_bytes) {
 
 TEST(c_pattern, matches_whole_texts) {
     for (const auto& [expression, text, matches] : values_test::rows<3>(R"(
-        .+T.+(Z|[+\-].+) 2001-01-01T00:00:00Z 1        .+T.+(Z|[+\-].+) 2001-01-01T00:00:00+01:00 1
         .+T.+(Z|[+\-].+) 2001-01-01T00:00:00-05:00 1   .+T.+(Z|[+\-].+) 2001-01-01T00:00:00 0
         a+ xaaa 0   a+ aaax 0   '' '' 1   ([ '' 0   ([ ([ 0   ä. ä€ 1)")) {
         testing::internal::CaptureStderr();

@@ -46,26 +46,24 @@ void expect_forms(const char* same, const char* changed, const char* refused) {
 }
 
 TEST(date_family, forms) {
-    expect_forms<c_datetime>(R"(
-        2001-12-31T23:59:59Z   2001-12-31T23:59:59   2001-12-31T23:59:59+05:30   2001-12-31T23:59:59-00:30
-        2001-01-01T00:00:05.5Z   2001-01-01T00:00:12.25Z   -0099-01-01T00:00:00Z   12345-01-01T00:00:00Z)",
-                             R"(
+    expect_forms<c_datetime>(
+        "2001-12-31T23:59:59 2001-12-31T23:59:59+05:30 2001-12-31T23:59:59-00:30 2001-01-01T00:00:05.5Z "
+        "-0099-01-01T00:00:00Z 12345-01-01T00:00:00Z",
+        R"(
         2001-12-31T23:59:59+00:00 2001-12-31T23:59:59   2001-02-31T25:61:61.5+99:99 2001-02-31T25:61:61.5+100:39
         2001-01-01T00:00:00. 2001-01-01T00:00:00   2001-01-01T00:00:00.0005Z 2001-01-01T00:00:00.000500Z
         +2001-01-01T00:00:00Z 2001-01-01T00:00:00Z)",
-                             R"(
-        '' 0000-00-00T00:00:00                         x 0000-00-00T00:00:00
-        _2001-01-01T07:08:09Z 0000-00-00T00:00:00      --2001-01-01T00:00:00Z 0000-00-00T00:00:00
-        201-01-01T00:00:00Z 0201-00-00T00:00:00        -201-01-01T00:00:00Z 0201-00-00T00:00:00
+        R"(
+        '' 0000-00-00T00:00:00                         _2001-01-01T07:08:09Z 0000-00-00T00:00:00
+        --2001-01-01T00:00:00Z 0000-00-00T00:00:00     -201-01-01T00:00:00Z 0201-00-00T00:00:00
         2001-1-01T00:00:00Z 2001-01-00T00:00:00        2001-123-01T00:00:00Z 2001-123-00T00:00:00
         2001/01-01T00:00:00Z 2001-00-00T00:00:00       2001-01-1T00:00:00Z 2001-01-01T00:00:00
         2001-01-01_00:00:00Z 2001-01-01T00:00:00       2001-01-01T7:08:09Z 2001-01-01T07:00:00
-        2001-01-01T07:8:09Z 2001-01-01T07:08:00        2001-01-01T07:08:9Z 2001-01-01T07:08:09
-        2001-01-01T07:08:9.Z 2001-01-01T07:08:09Z      -2001-01-01T07:08:9Z 2001-01-01T07:08:09
-        -2001-01-01T07:08:09+1 -2001-01-01T07:08:09    2001-01-01T07:08:09z 2001-01-01T07:08:09
-        2001-01-01T07:08:09Z_ 2001-01-01T07:08:09      2001-01-01T07:08:09+01:0 2001-01-01T07:08:09
-        2001-01-01T07:08:09+0100 2001-01-01T07:08:09)");
-    expect_forms<c_date>("2001-12-31 2001-12-31Z -0099-01-01 12345-01-01 2001-12-31-14:00", "+2001-01-01 2001-01-01",
+        2001-01-01T07:8:09Z 2001-01-01T07:08:00        -2001-01-01T07:08:9Z 2001-01-01T07:08:09
+        2001-01-01T07:08:9.Z 2001-01-01T07:08:09Z      -2001-01-01T07:08:09+1 -2001-01-01T07:08:09
+        2001-01-01T07:08:09z 2001-01-01T07:08:09       2001-01-01T07:08:09Z_ 2001-01-01T07:08:09
+        2001-01-01T07:08:09+01:0 2001-01-01T07:08:09   2001-01-01T07:08:09+0100 2001-01-01T07:08:09)");
+    expect_forms<c_date>("2001-12-31 -0099-01-01 2001-12-31-14:00", "+2001-01-01 2001-01-01",
                          "2001-12-31T00:00:00 2001-12-31");
     expect_forms<c_time>("12:00:00 12:00:00Z 12:00:00.5-01:30", "12:00:00+00:00 12:00:00   +12:00:00 00:00:00",
                          "1:00:00 01:00:00   12:00 12:00:00");
@@ -79,8 +77,7 @@ TEST(date_family, forms) {
 
 TEST(c_datetime, assignment_keeps_what_lies_behind_the_stopping_point) {
     for (const auto& [text, stored] : rows<2>(R"(
-        1999-02-03T04:05:06 1999,2,3,4,5,6,0          1999-01-01T00:00:00+01:00 1999,1,1,0,0,0,60
-        -0099-01-01T00:00:00-00:30 -99,1,1,0,0,0,-30  2001-02-31T25:61:61.5+99:99 2001,2,31,25,61,61.5,6039
+        -0099-02-03T04:05:06-00:30 -99,2,3,4,5,6,-30  2001-02-31T25:61:61.5+99:99 2001,2,31,25,61,61.5,6039
         1999-1 1999,1,31,23,59,58.5,0Z                1999-01-01T00:00:00+1 1999,1,1,0,0,0,0Z
         '' 0,12,31,23,59,58.5,0Z                      1999-01-01T00:00: 1999,1,1,0,0,0,0Z)")) {
         c_datetime value("2001-12-31T23:59:58.5Z");
@@ -117,7 +114,6 @@ TEST(c_datetime, order_ignores_the_zone) {
             2001-02-02T00:59:59 2001-02-02T01:00:59.5 2001-02-02T01:01:00 2001-02-02T01:01:00.5)"))
         zulu.push_back(text + 'Z'), ahead.push_back(text + "+05:00");
     expect_order<c_datetime>(zulu, ahead);
-    EXPECT_TRUE(c_time("12:00:00Z") == c_time("12:00:00+00:00"));
 }
 
 TEST(c_datetime, seconds_in_the_streams_precision) {
@@ -139,9 +135,17 @@ bool agrees_with_engine(const std::string& text) {
     return known == hqf::zone_pattern::ask_engine || pattern.is_match(text) == (known == hqf::zone_pattern::matched);
 }
 
-// The short roads against the long ones, over the common form and over everything one change away from it.
+// The short roads against the long ones, over the common form and over everything one change away from it; the zone
+// pattern over any short text, too.
 TEST(datetime_text, short_roads_agree_with_the_long_ones) {
     std::mt19937 random(3);
+    const char* const pieces[] = {"T", "Z", "+", "-", "\xC3\xA4", "a", "\n", "\r", "\t", "\x01", "\xFF"};
+    for (int i = 0; i < 100000; ++i) {
+        std::string text;
+        for (auto count = random() % 9; count > 0; --count)
+            text += pieces[random() % (random() % 8 == 0 ? 11 : 6)];
+        ASSERT_TRUE(agrees_with_engine(text)) << testing::PrintToString(text);
+    }
     const auto seeds = words("2001-02-28T13:59:07.25Z 1999-12-31T00:00:00+05:30 2024-01-01T10:20:30-00:00 "
                              "2024-01-01T10:20:30");
     const std::string alphabet = "0123456789-+:.TZ \xC3\xA4\n\x01";
@@ -171,17 +175,6 @@ TEST(datetime_text, short_roads_agree_with_the_long_ones) {
     EXPECT_GT(short_roads, 10000) << "the common form must take the short road";
 }
 
-TEST(datetime_text, zone_pattern_on_any_short_text) {
-    const char* const pieces[] = {"T", "Z", "+", "-", "\xC3\xA4", "a", "\n", "\r", "\t", "\x01", "\xFF"};
-    std::mt19937 random(4);
-    for (int i = 0; i < 100000; ++i) {
-        std::string text;
-        for (auto count = random() % 9; count > 0; --count)
-            text += pieces[random() % (random() % 8 == 0 ? 11 : 6)];
-        ASSERT_TRUE(agrees_with_engine(text)) << testing::PrintToString(text);
-    }
-}
-
 TEST(datetime_text, extreme_values_are_written_as_by_the_stream) {
     c_datetime v;
     for (const float secs : {0.0f, -0.0f, 0.5f, 59.999f, 99.0f, 100.0f, 1e6f, 1e7f, FLT_MAX, -FLT_MAX, 1e-9f, -0.5f,
@@ -199,8 +192,8 @@ TEST(c_duration, forms) {
     expect_forms<c_duration>("P -P P1Y P1M P1D PT1H PT1M PT1S PT5.5S -P1Y2M3DT4H5M6.7S P1YT2M P4294967295Y", R"(
         PT0S P   PT.5S PT0.5S   +P1D P1D   P0012M P12M   PT1H.5S PT1H0.5S   PT0.0005S PT0.000500S   PT1.S PT1S)",
                              R"(
-        '' P   - -P   1Y P   P1 P   P1S P   P1YT P1Y   PT P   PT1 P   P1D1 P1D   P1Y2 P1Y   P1M1Y P1M   P1YM P1Y
-        PT1M1H PT1M   PT1S1M PT1S   PT1H. PT1H   PT1.5 P   PT1H.S PT1H   P1Y_ P1Y   P-1Y P   PT5.5H P   --P1Y -P)");
+        - -P   1Y P   P1 P   P1S P   P1YT P1Y   PT P   PT1 P   P1D1 P1D   P1M1Y P1M   P1YM P1Y   PT1M1H PT1M
+        PT1S1M PT1S   PT1H. PT1H   PT1.5 P   PT1H.S PT1H   P1Y_ P1Y   P-1Y P   PT5.5H P   --P1Y -P)");
     c_duration assigned("-P9Y9M9DT9H9M9.5S");
     assigned = "x";
     EXPECT_EQ(assigned.get_as_string(), "P") << "the old fields are cleared first";
@@ -208,8 +201,7 @@ TEST(c_duration, forms) {
 
 TEST(c_duration, normalize_carries_up_to_days_and_years) {
     for (const auto& [text, normal] : rows<2>(R"(
-        PT90S PT1M30S   P12M P1Y   P31M P2Y7M   PT3600S PT1H   PT1439M120.5S P1DT1M0.5S   P400D P400D
-        -P1M40DT25H -P1M41DT1H)")) {
+        PT90S PT1M30S   P31M P2Y7M   PT1439M120.5S P1DT1M0.5S   P400D P400D   -P1M40DT25H -P1M41DT1H)")) {
         c_duration value(text.c_str());
         value.normalize();
         EXPECT_EQ(value.get_as_string(), normal) << text;
@@ -222,12 +214,11 @@ TEST(c_duration, normalize_carries_up_to_days_and_years) {
 
 TEST(c_duration, order_exists_only_where_months_leave_it_settled) {
     for (const auto& [a, relation, b] : rows<3>(R"(
-        PT90S = PT1M30S   P12M = P1Y   P1M ? P30D   P30D ? P1M   P1M > P32D   P32D < P1M   P1M ? P29D   P1M > P28D
-        P28D < P1M   P2M ? P60D   P2M > P59D   P2M > P62D   P2M ? P61D   P1Y > P365D   P1Y1M ? P1Y29D   P2Y > P1Y1M
-        P1Y1M < P2Y   PT1S < PT2S   P1D = PT24H   P1DT1H > PT24H   P5M < P12M1D)"))
+        PT90S = PT1M30S   P12M = P1Y   P30D ? P1M   P1M > P32D   P32D < P1M   P1M ? P29D   P1M > P28D   P2M ? P60D
+        P2M > P59D   P2M > P62D   P2M ? P61D   P1Y > P365D   P1Y1M ? P1Y29D   P1Y1M < P2Y   PT1S < PT2S
+        P1D = PT24H   P1DT1H > PT24H   P5M < P12M1D)"))
         EXPECT_TRUE(stands(c_duration(a.c_str()), relation[0], c_duration(b.c_str()))) << a << relation << b;
-    EXPECT_FALSE(c_duration("P1Y") == c_duration("-P1Y"));
-    EXPECT_TRUE(c_duration("P1Y") != c_duration("-P1Y"));
+    EXPECT_TRUE(c_duration("P1Y") != c_duration("-P1Y") && !(c_duration("P1Y") == c_duration("-P1Y")));
 }
 
 } // namespace

@@ -55,11 +55,7 @@ void expect_order(const std::vector<std::string>& ascending, const std::vector<s
     ASSERT_EQ(ascending.size(), respelled.size());
     for (std::size_t i = 0; i < ascending.size(); ++i)
         for (std::size_t j = 0; j < respelled.size(); ++j)
-            EXPECT_TRUE(stands(T(ascending[i]),
-                               i < j   ? '<'
-                               : i > j ? '>'
-                                       : '=',
-                               T(respelled[j])))
+            EXPECT_TRUE(stands(T(ascending[i]), "=<>"[(i < j) + 2 * (i > j)], T(respelled[j])))
                 << ascending[i] << " " << respelled[j];
 }
 

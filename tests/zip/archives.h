@@ -20,16 +20,12 @@ namespace zip_test {
 
 /// A folder of its own for each test program, gone at its end.
 inline const std::filesystem::path& folder() {
-    struct temporary {
-        temporary()
-            : path(std::filesystem::temp_directory_path() / ("hqf-zip-" + std::to_string(::getpid()))) {
-            std::filesystem::create_directories(path);
-        }
-        ~temporary() { std::filesystem::remove_all(path); }
-        std::filesystem::path path;
+    const auto path = std::filesystem::temp_directory_path() / ("hqf-zip-" + std::to_string(::getpid()));
+    struct temporary : std::filesystem::path {
+        ~temporary() { remove_all(*this); }
     };
-    static const temporary made;
-    return made.path;
+    static const temporary made{path};
+    return std::filesystem::create_directories(made), made;
 }
 
 inline std::wstring wide(const std::filesystem::path& path) {
@@ -51,17 +47,11 @@ inline std::uint32_t crc_of(const std::string& bytes) {
 }
 
 inline std::string deflated(const std::string& bytes) {
-    std::string packed(bytes.size() + 100, '\0');
-    z_stream stream{};
-    deflateInit2(&stream, Z_DEFAULT_COMPRESSION, Z_DEFLATED, -15, 8, Z_DEFAULT_STRATEGY);
-    stream.next_in = reinterpret_cast<Bytef*>(const_cast<char*>(bytes.data()));
-    stream.avail_in = static_cast<uInt>(bytes.size());
-    stream.next_out = reinterpret_cast<Bytef*>(packed.data());
-    stream.avail_out = static_cast<uInt>(packed.size());
-    deflate(&stream, Z_FINISH);
-    packed.resize(stream.total_out);
-    deflateEnd(&stream);
-    return packed;
+    uLongf size = compressBound(static_cast<uLong>(bytes.size()));
+    std::string packed(size, '\0');
+    compress(reinterpret_cast<Bytef*>(packed.data()), &size, reinterpret_cast<const Bytef*>(bytes.data()),
+             static_cast<uLong>(bytes.size()));
+    return packed.substr(2, size - 6); // without what zlib puts around a stream
 }
 
 inline std::string bzipped(const std::string& bytes) {

