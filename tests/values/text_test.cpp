@@ -33,10 +33,14 @@ TEST(convert, utf8_to_wide) {
         row{"a\xED\xA0\xB4" + clef8, L"a"}, row{"a\xC3", L"a"}, row{"a\xE2\x82", L"a"}, row{"a\xF0\x9D\x84", L"a"},
         row{"a\xC3(b", L"a"}, row{"a\xE2\x82(b", L"a"}, row{"a\x80z", L"a"}, row{"a\xF8\x88\x80\x80\x80z", L"a"});
     for (const auto& [in, expected] : rows)
-        for (std::size_t prefix = 0; prefix < 18; ++prefix) {
+        for (std::size_t prefix = 0; prefix < 1028; prefix += prefix == 17 ? 1000 : 1) { // long ones go in pieces
             std::wstring out = L"old";
             EXPECT_EQ(convert(&out, std::string(prefix, '.') + in), std::wstring(prefix, L'.') + expected)
                 << in << " behind " << prefix;
+            std::string accents;
+            while (accents.size() < 2 * prefix)
+                accents += "\xC3\xA9";
+            EXPECT_EQ(convert(&out, accents + in), std::wstring(prefix, L'\xE9') + expected) << in << prefix;
         }
     std::string narrow = "old";
     EXPECT_EQ(vtostring(narrow, "a\xC3"), "a\xC3") << "the narrow form is a plain copy";
@@ -60,7 +64,8 @@ TEST(convert, wide_to_utf8_and_escaped) {
         row{std::wstring(1, wchar_t(0xFFFFFF3C)), "\xEF\xBF\xBD", "\xEF\xBF\xBD"});
     for (const auto& [text, plain, escaped] : rows) {
         std::string out = "old";
-        EXPECT_EQ(convert(&out, text), plain);
+        for (const std::size_t prefix : {0u, 1022u, 1023u, 1024u})
+            EXPECT_EQ(convert(&out, std::wstring(prefix, L'.') + text), std::string(prefix, '.') + plain) << prefix;
         for (const std::size_t prefix : {0u, 1u, 505u, 506u, 507u, 512u, 1100u}) { // around the size of a block
             const std::wstring in = std::wstring(prefix, L'.') + text;
             std::ostringstream os;
