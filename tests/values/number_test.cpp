@@ -176,4 +176,22 @@ TEST(write_number, as_the_stream_on_random_numbers) {
     }
 }
 
+TEST(has_default_format, notices_whatever_changes_a_number) {
+    struct grouped : std::numpunct<char> {
+        std::string do_grouping() const override { return "\3"; }
+    };
+    for (const auto flag : {std::ios::hex, std::ios::fixed, std::ios::showpos, std::ios::uppercase, std::ios::left}) {
+        std::ostringstream os;
+        os.setf(flag);
+        EXPECT_FALSE(hqf::has_default_format(os)) << flag;
+    }
+    std::ostringstream precise, padded, local, heedless;
+    precise << std::setprecision(5);
+    padded << std::setw(5);
+    local.imbue(std::locale(std::locale::classic(), new grouped));
+    heedless << std::boolalpha << std::setfill('x');
+    for (std::ostream* const os : {&precise, &padded, &local, &heedless})
+        EXPECT_EQ(hqf::has_default_format(*os), os == &heedless);
+}
+
 } // namespace

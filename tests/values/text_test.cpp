@@ -135,6 +135,10 @@ TEST(is_valid_utf8_char_sequence, first_two_bytes_decide) {
 TEST(path_to_utf8, joins_pairs_and_keeps_half_ones) {
     EXPECT_EQ(hqf::path_to_utf8(L"/t\x00E4\x20AC" + clef16 + std::wstring{wchar_t(0x1D11E)} + high + L"A"),
               "/t\xC3\xA4\xE2\x82\xAC" + clef8 + clef8 + "\xED\xA0\xB4" + "A");
+    const std::string path = testing::TempDir() + "hqf_values_remove";
+    std::fclose(hqf::open_file(std::wstring(path.begin(), path.end()), "wb"));
+    EXPECT_TRUE(hqf::remove_file(std::wstring(path.begin(), path.end())));
+    EXPECT_EQ(hqf::open_file(std::wstring(path.begin(), path.end()), "rb"), nullptr);
 }
 
 } // namespace

@@ -108,6 +108,9 @@ TEST(zip_read, close_file_hands_time_and_attributes_to_a_file) {
     hqf::file_status status;
     ASSERT_TRUE(hqf::get_file_status(wide(folder() / "unpacked"), status));
     EXPECT_TRUE(status.modified == zip.GetFileInfo(0)->GetTime() && status.attributes == 0x21);
+    ASSERT_TRUE(hqf::set_file_attributes(wide(folder() / "unpacked"), 0));
+    ASSERT_TRUE(hqf::get_file_status(wide(folder() / "unpacked"), status));
+    EXPECT_EQ(status.attributes, 0x20U) << "writable again";
 }
 
 TEST(zip_read, exhaustive_goes_past_the_count) {
