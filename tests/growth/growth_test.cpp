@@ -211,7 +211,7 @@ TEST(growth, documents) {
 /// What the colours of a document cost doesn't depend on how many there are.
 TEST(growth, palettes) {
     counts few;
-    for (const unsigned int colours : {1000, 2000, 4000, 8000}) { // of 900 bytes
+    for (const unsigned int colours : {1000U, 2000U, 4000U, 8000U}) { // of 900 bytes
         const string lab =
             space("CIELab", "Tristimulus", element("L", "52.25") + element("A", "-38.5") + element("B", "0.125"));
         const string text = document(
