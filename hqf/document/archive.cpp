@@ -1,6 +1,7 @@
 #include "hqf/document/archive.h"
 
 #include "hqf/model/Hqf.h"
+#include "hqf/platform/pages.h"
 #include "hqf/platform/paths.h"
 #include "hqf/xml_in/c_xml_reader_memory.h"
 #include "hqf/zip/CZipArchive.h"
@@ -28,6 +29,7 @@ lmx::elmx_error load_archive(Hqf& document, const std::wstring& path) {
     try {
         const unsigned int size = archive.GetFileInfo(0)->GetUncompressedSize();
         CZipAutoBuffer xml(size);
+        hqf::expect_filling(xml.GetBuffer(), size);
         char one_more = 0;
         require(archive.ReadFile(xml.GetBuffer(), size) == size);
         require(archive.ReadFile(&one_more, 1) == 0);
