@@ -1,5 +1,6 @@
 #include "hqf/document/archive.h"
 
+#include "hqf/frame/entry.h"
 #include "hqf/model/Hqf.h"
 #include "hqf/platform/pages.h"
 #include "hqf/platform/paths.h"
@@ -36,6 +37,7 @@ lmx::elmx_error load_archive(Hqf& document, const std::wstring& path) {
         require(archive.CloseFile() == 1);
         archive.Close();
         lmx::c_xml_reader_memory reader(xml.GetBuffer(), size);
+        hqf::frame::note_lasting_source(reader);
         return document.unmarshal(reader);
     } catch (...) {
         archive.Close(CZipArchive::closeAfterException);

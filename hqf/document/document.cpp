@@ -8,9 +8,7 @@
 #include "hqf/frame/entry.h"
 #include "hqf/model/Hqf.h"
 #include "hqf/platform/paths.h"
-#include "hqf/values/text.h"
-#include "hqf/values/transcode.h"
-#include "hqf/xml_out/text_stream.h"
+#include "hqf/xml_in/wide_source.h"
 
 namespace hqf_v2 {
 
@@ -45,9 +43,9 @@ lmx::elmx_error Hqf::loadFile(const std::wstring& path) {
 }
 
 lmx::elmx_error Hqf::loadString(const std::wstring& xml) {
-    std::string text;
-    lmx::convert(&text, xml);
-    return unmarshal(text);
+    hqf::wide_source source(xml);
+    lmx::c_xml_reader reader(source);
+    return unmarshal(reader);
 }
 
 lmx::elmx_error Hqf::writeFile(const std::wstring& path) {
@@ -61,14 +59,8 @@ lmx::elmx_error Hqf::writeFile(const std::wstring& path) {
 }
 
 XMLDocumentResult Hqf::writeString() {
-    hqf::text_stream stream;
-    const lmx::elmx_error error = hqf::frame::write_stream(stream, this, root_name, marshal_stamped);
     std::wstring text;
-    if (error == lmx::err_no_error) {
-        std::string utf8;
-        stream.move_to(utf8);
-        hqf::assign_wide(text, utf8.data(), utf8.size());
-    }
+    const lmx::elmx_error error = hqf::frame::write_string(&text, this, root_name, marshal_stamped, &text_size_);
     return XMLDocumentResult(std::move(text), error);
 }
 

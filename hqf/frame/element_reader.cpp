@@ -13,6 +13,7 @@ namespace hqf::frame {
 namespace {
 
 constexpr char source_name[] = "Hqf";
+constexpr int xsi_namespace_id = 5;
 
 /// Counts the model elements that are open in a reader.
 class depth_count {
@@ -31,6 +32,31 @@ private:
 };
 
 } // namespace
+
+/// Before an event of the general road: leaves the reader as that road would have left it behind what the fast one has
+/// read.
+void element_reader::settle() {
+    reader_access::note_general_step(reader_);
+    fast_trace& trace = reader_access::trace(reader_);
+    using name_kind = fast_trace::name_kind;
+    switch (trace.kind) {
+    case name_kind::none: return;
+    case name_kind::element: {
+        const auto& name = *static_cast<const element_name*>(trace.name);
+        reader_access::set_name(reader_, name.text(), 3, format_namespace_id);
+        break;
+    }
+    case name_kind::attribute:
+        reader_access::crack_name(reader_, static_cast<const attribute_name*>(trace.name)->plain());
+        break;
+    case name_kind::nil: reader_access::set_name(reader_, "xsi:nil", 3, xsi_namespace_id); break;
+    case name_kind::type: reader_access::set_name(reader_, "xsi:type", 3, xsi_namespace_id); break;
+    }
+    if (const auto* const value = static_cast<const row*>(trace.value); value != nullptr)
+        reader_access::set_ws_mode(reader_, whitespace_of(value->what, value->rules));
+    reader_access::forget_attributes(reader_);
+    trace = {};
+}
 
 bool element_reader::report(lmx::elmx_error code, const std::string& item, int line) {
     error_ = reader_.handle_error(code, item, source_name, line);
@@ -56,12 +82,23 @@ lmx::elmx_error element_reader::element(std::string_view name) {
 
 lmx::elmx_error element_reader::entered(const element_name& name) {
     const depth_count depth(reader_);
-    const lmx::c_string_stack_node node(reader_.get_element_name_stack(), {name.open + 1, name.length - 2u});
+    const lmx::c_string_stack_node node(reader_.get_element_name_stack(), name.text(), lmx::c_string_stack::padded);
     name_ = &node;
     fast_name_ = &name;
-    const lmx::c_xml_reader_local scope(&reader_);
-    if (body() && !is_over_) end_tag();
+    row_cursor at;
+    if (rows_.shape == form::sequence)
+        fast_children(at);
+    else if (rows_.shape == form::choice)
+        is_over_ = fast_option() && fast_end_tag();
+    if (!is_over_ && error_ == lmx::err_no_error) rest_of_content(at);
     return error_;
+}
+
+/// What the fast road has left. Only the general road declares namespaces, so only it needs a scope.
+void element_reader::rest_of_content(row_cursor at) {
+    const lmx::c_xml_reader_local scope(&reader_);
+    const bool is_read = rows_.shape == form::sequence ? children(at) : begun_ || body();
+    if (is_read && !is_over_) end_tag();
 }
 
 // The start tag
@@ -150,7 +187,7 @@ void element_reader::end_tag() {
     if (!in_hand_) {
         if (fast_end_tag()) return;
         lmx::elmx_error error = lmx::err_no_error;
-        reader_access::settle(reader_);
+        settle();
         reader_.get_element_event(successors(), &error, &reader_.item_name);
         // Behind children the report names what was read; in place of a value or of nothing it names the element.
         if (error != lmx::err_no_error &&
@@ -175,8 +212,11 @@ bool element_reader::body() {
     switch (rows_.shape) {
     case form::wildcard: return wildcard();
     case form::choice: return choice();
-    default: return children();
+    default: break;
     }
+    row_cursor at;
+    if (!in_hand_) fast_children(at);
+    return is_over_ || error_ != lmx::err_no_error ? error_ == lmx::err_no_error : children(at);
 }
 
 bool element_reader::body_from_event() {
@@ -189,7 +229,7 @@ bool element_reader::body_from_event() {
 bool element_reader::first_event() {
     begun_ = in_hand_ = true;
     lmx::elmx_error error = lmx::err_no_error;
-    reader_access::settle(reader_);
+    settle();
     reader_.get_element_event(nullptr, &error, &reader_.item_name);
     if (error != lmx::err_no_error && !report(error, name_->get_str(), __LINE__)) return false;
     if (event() == lmx::EXE_ELEMENT_END) {
@@ -210,23 +250,24 @@ bool element_reader::next_event() {
     if (!begun_) return first_event();
     in_hand_ = true;
     lmx::elmx_error error = lmx::err_no_error;
-    reader_access::settle(reader_);
+    settle();
     reader_.get_element_event(successors(), &error, &reader_.item_name);
     return error == lmx::err_no_error || report(error, reader_.item_name, __LINE__);
 }
 
 // Children
 
-bool element_reader::children() {
-    for (row_cursor at; at.row < rows_.row_count;) {
+/// From the cursor on, where the fast road doesn't get any further.
+bool element_reader::children(row_cursor at) {
+    while (at.row < rows_.row_count) {
         if (!in_hand_) {
-            fast_children(at);
-            if (error_ != lmx::err_no_error || is_over_) return error_ == lmx::err_no_error;
-            if (at.row == rows_.row_count) break;
             if (!next_event()) return false;
             if (is_over_) return true;
         }
         if (!child_of_row(at)) return false;
+        if (in_hand_) continue;
+        fast_children(at);
+        if (is_over_ || error_ != lmx::err_no_error) return error_ == lmx::err_no_error;
     }
     return !rows_.minimums_at_end || minimums_at_end();
 }

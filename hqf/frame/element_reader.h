@@ -48,6 +48,7 @@ private:
     bool report(lmx::elmx_error code, const std::string& item, int line);
 
     // The general road.
+    void settle();
     bool start_tag();
     bool nil_attribute(const std::string& name);
     void content();
@@ -58,7 +59,8 @@ private:
     bool first_event();
     bool next_event();
     int event() const { return reader_.get_current_event(); }
-    bool children();
+    bool children(row_cursor at);
+    void rest_of_content(row_cursor at);
     bool child_of_row(row_cursor& at);
     bool read_child(const row& r);
     bool read_object(const class_rows& rows, void* object);
@@ -74,14 +76,18 @@ private:
     // Steps over the window.
     bool fast_end_tag();
     bool fast_end_tag(window& in, const char* at);
+    const char* named_end_tag(window& in, const char* at) const;
     bool is_end_due(row_cursor at) const;
     const lmx::s_event_map* successors() const;
     void fast_children(row_cursor& at);
-    const row* find_row(const char* tag, row_cursor& at, int& member) const;
     bool fast_child(window& in, const char* at, const row& r, int member);
+    bool fast_real(window& in, const char* at, const row& r);
     bool fast_simple(window& in, const char* at, const row& r);
+    bool value_read(window& in, const char* at, const row& r);
     bool fast_text_item(window& in, const char* at, const row& r);
+    bool fast_moment_item(window& in, const char* at, const row& r);
     bool fast_object(window& in, const char* at, const row& r);
+    bool fast_item(window& in, const char* at, const row& r);
     bool fast_member(window& in, const char* at, const row& r, int member);
     bool fast_head(window& in, const char* at, const row& r);
     void* group_to_fill(const row& r);
@@ -89,7 +95,7 @@ private:
     bool is_too_deep() const;
     bool enter(const parsed_start& start, const class_rows& rows, const element_name& name, void* object);
     void remember(const parsed_start& start, const class_rows& rows, const element_name& name);
-    void remember_value(const element_name& name, lmx::elmx_whitespace mode);
+    void remember_value(const row& r);
 
     const class_rows& rows_;
     void* const object_;

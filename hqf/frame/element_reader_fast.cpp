@@ -1,6 +1,9 @@
 /// The fast road: whole steps over the window. What a step has not read to its end it has not read at all.
 
 #include "hqf/frame/element_reader.h"
+
+#include <utility>
+
 #include "hqf/frame/objects.h"
 #include "hqf/frame/read_value.h"
 #include "hqf/xml_in/limits.h"
@@ -10,86 +13,103 @@ namespace hqf::frame {
 
 namespace {
 
-/// The window, and the place of the '<' of the next tag in it, which is null where no step can be taken.
-struct tag_place {
-    window* in = nullptr;
-    const char* at = nullptr;
+/// What the general road would remember of an attribute that only it looks for.
+constexpr row nil_row = {kind::boolean, 0, 0, 0, nullptr, nullptr, nullptr, nullptr};
+constexpr row type_row = {kind::text, 0, 0, 0, nullptr, nullptr, nullptr, nullptr};
 
-    explicit tag_place(lmx::c_xml_reader& reader)
-        : in(reader_access::begin_element(reader)) {
-        if (in == nullptr) return;
-        const char* const tag = in->skip_space(in->p);
-        if (in->room(tag, longest_name_room) && *tag == '<') at = tag;
+/// The place of the '<' of the next tag in the window, behind white space; null where no step can be taken.
+inline const char* next_tag(window& in) {
+    // Most tags have a short indent.
+    const char* tag = in.room(in.p, 16 + longest_name_room) ? skip_short_space(in.p) : nullptr;
+    if (tag == nullptr) {
+        tag = in.skip_space(in.p);
+        if (!in.room(tag, longest_name_room)) return nullptr;
     }
-};
-
-std::string_view qualified_name(const element_name& name) {
-    return {name.open + 1, name.length - 2u};
+    return *tag == '<' ? tag : nullptr;
 }
+
+using name_kind = fast_trace::name_kind;
+
+/// An object that nobody holds yet.
+class new_object {
+public:
+    explicit new_object(const class_rows& rows)
+        : rows_(rows)
+        , object_(rows.create()) {}
+    new_object(const new_object&) = delete;
+    new_object& operator=(const new_object&) = delete;
+    ~new_object() {
+        if (object_ != nullptr) rows_.destroy(object_);
+    }
+    void* get() const { return object_; }
+    void* release() { return std::exchange(object_, nullptr); }
+
+private:
+    const class_rows& rows_;
+    void* object_;
+};
 
 } // namespace
 
-// What the general road would remember
+// What the general road would remember: settle() hands it over.
 
-void element_reader::remember_value(const element_name& name, lmx::elmx_whitespace mode) {
-    fast_trace& trace = reader_access::trace(reader_);
-    trace.kind = fast_trace::name_kind::element;
-    trace.name = qualified_name(name);
-    trace.has_mode = true;
-    trace.mode = mode;
+void element_reader::remember_value(const row& r) {
+    reader_access::trace(reader_) = {name_kind::element, r.name, &r};
 }
 
 void element_reader::remember(const parsed_start& start, const class_rows& rows, const element_name& name) {
     fast_trace& trace = reader_access::trace(reader_);
-    trace.kind = fast_trace::name_kind::element;
-    trace.name = qualified_name(name);
     if (start.nil) {
-        trace.kind = fast_trace::name_kind::xsi;
-        trace.name = "xsi:nil";
-        trace.has_mode = true;
-        trace.mode = lmx::collapse;
-    } else if (start.count != 0) {
+        trace.kind = name_kind::nil;
+        trace.value = &nil_row;
+        return;
+    }
+    if (start.count == 0) {
+        trace.kind = name_kind::element;
+        trace.name = &name;
+    } else {
         const row& last = *start.attributes[start.count - 1];
-        trace.kind = fast_trace::name_kind::attribute;
-        trace.name = {last.attribute->open + 1, last.attribute->length - 3u};
-        trace.has_mode = true;
-        trace.mode = whitespace_of(last.what, last.rules);
+        trace = {name_kind::attribute, last.attribute, &last};
     }
-    if (start.complete && !start.nil) {
-        trace.has_mode = true;
-        trace.mode = whitespace_of(rows.rows->what, rows.rows->rules);
-    }
+    if (start.complete) trace.value = rows.rows;
 }
 
 // Tags
 
 bool element_reader::fast_end_tag() {
-    const auto [in, at] = tag_place(reader_);
+    window* const in = reader_access::begin_element(reader_);
+    const char* const at = in == nullptr ? nullptr : next_tag(*in);
     return at != nullptr && at[1] == '/' && fast_end_tag(*in, at);
 }
 
 /// With "</" at the place.
-bool element_reader::fast_end_tag(window& in, const char* at) {
-    if (fast_name_ != nullptr) {
-        at = close_tag(in, at, *fast_name_);
-        if (at == nullptr) return false;
-        in.p = at;
-    } else {
-        const std::string_view name = name_->get_str();
-        if (!in.room(at, name.size() + 3) || std::memcmp(at + 2, name.data(), name.size()) != 0 ||
-            at[2 + name.size()] != '>')
-            return false;
-        in.p = at + name.size() + 3;
-    }
+inline bool element_reader::fast_end_tag(window& in, const char* at) {
+    at = fast_name_ != nullptr ? close_tag(in, at, *fast_name_) : named_end_tag(in, at);
+    if (at == nullptr) return false;
+    in.p = at;
     reader_.restore_event(lmx::EXE_ELEMENT_END);
     return true;
 }
 
+/// Behind the end tag of an element that the general road began, with the name as that read it.
+const char* element_reader::named_end_tag(window& in, const char* at) const {
+    const std::string_view name = name_->get_str();
+    const bool is_here = in.room(at, name.size() + 3) && std::memcmp(at + 2, name.data(), name.size()) == 0 &&
+                         at[2 + name.size()] == '>';
+    return is_here ? at + name.size() + 3 : nullptr;
+}
+
 /// Goes into an element whose start tag has been read, or is done with it if that was all.
 bool element_reader::enter(const parsed_start& start, const class_rows& rows, const element_name& name, void* object) {
-    remember(start, rows, name);
-    store_start(start, rows, object);
-    if (start.complete) return true;
+    if (start.is_plain()) {
+        fast_trace& trace = reader_access::trace(reader_);
+        trace.kind = name_kind::element;
+        trace.name = &name;
+    } else {
+        remember(start, rows, name);
+        store_start(start, rows, object);
+        if (start.complete) return true;
+    }
     error_ = element_reader(rows, object, reader_).entered(name);
     return error_ == lmx::err_no_error;
 }
@@ -97,8 +117,10 @@ bool element_reader::enter(const parsed_start& start, const class_rows& rows, co
 // Children
 
 void element_reader::fast_children(row_cursor& at) {
-    for (;;) {
-        const auto [in, tag] = tag_place(reader_);
+    window* in = reader_access::begin_element(reader_);
+    const row* const end = rows_.rows + rows_.row_count;
+    for (const unsigned int steps = reader_access::general_steps(reader_); in != nullptr;) {
+        const char* const tag = next_tag(*in);
         if (tag == nullptr) return;
         if (tag[1] == '/') {
             // An element with no content at all is accepted here if its class is tolerant; else the general road
@@ -106,54 +128,60 @@ void element_reader::fast_children(row_cursor& at) {
             if (begun_ ? is_end_due(at) : rows_.tolerant) is_over_ = fast_end_tag(*in, tag);
             return;
         }
+        // The row that the tag belongs to, from the cursor on.
         int member = -1;
-        row_cursor found = at;
-        const row* const r = find_row(tag, found, member);
-        if (r == nullptr || !fast_child(*in, tag, *r, member)) return;
+        const row* r = rows_.rows + at.row;
+        for (bool seen = at.seen;; ++r, seen = false) {
+            if (r == end) return;
+            if (r->name != nullptr) {
+                if (starts(tag, *r->name)) break;
+            } else if (r->is_group()) {
+                member = find_member(tag, *r->type);
+                if (member >= 0) break;
+            }
+            if (r->has(mandatory_row) && !seen) return;
+        }
+        if (!fast_child(*in, tag, *r, member)) return;
         begun_ = true;
-        last_row_ = static_cast<int>(found.row);
-        at = found;
-        at.seen = true;
-        if (!r->is_list()) at.next_row();
+        const auto found = static_cast<unsigned int>(r - rows_.rows);
+        last_row_ = static_cast<int>(found);
+        at.row = r->is_list() ? found : found + 1;
+        at.seen = r->is_list();
+        // Where the general road has not been, nothing has changed but the place.
+        if (steps != reader_access::general_steps(reader_) || !in->is_ready())
+            in = reader_access::begin_element(reader_);
     }
 }
 
 /// Whether the rows from the cursor on are satisfied with what has been read, and nothing is looked at once more.
 bool element_reader::is_end_due(row_cursor at) const {
-    for (; at.row < rows_.row_count; at.next_row()) {
-        const row& r = rows_.rows[at.row];
-        if (r.has(mandatory_row) && !at.seen) return false;
-    }
-    return !rows_.minimums_at_end || is_occurs_ok(rows_, object_);
-}
-
-/// The row that the start tag here belongs to, with the cursor moved to it; null where the general road must decide.
-const row* element_reader::find_row(const char* tag, row_cursor& at, int& member) const {
-    for (; at.row < rows_.row_count; at.next_row()) {
-        const row& r = rows_.rows[at.row];
-        if (r.is_group()) {
-            member = find_member(tag, *r.type);
-            if (member >= 0) return &r;
-        } else if (r.name != nullptr && starts(tag, *r.name)) {
-            return &r;
-        }
-        if (r.has(mandatory_row) && !at.seen) return nullptr;
-    }
-    return nullptr;
+    const std::uint64_t coming = ~std::uint64_t{0} << (at.row + (at.seen ? 1 : 0));
+    return (rows_.mandatory_rows & coming) == 0 && (!rows_.minimums_at_end || is_occurs_ok(rows_, object_));
 }
 
 bool element_reader::fast_child(window& in, const char* at, const row& r, int member) {
     switch (r.what) {
+    case kind::child_list: return fast_item(in, at, r);
     case kind::child:
-    case kind::child_pointer:
-    case kind::child_list: return fast_object(in, at, r);
+    case kind::child_pointer: return fast_object(in, at, r);
     case kind::group:
     case kind::group_pointer:
     case kind::group_list: return fast_member(in, at, r, member);
-    case kind::text_list:
-    case kind::moment_list: return fast_text_item(in, at, r);
+    case kind::text_list: return fast_text_item(in, at, r);
+    case kind::moment_list: return fast_moment_item(in, at, r);
+    case kind::real: return fast_real(in, at, r);
     default: return fast_simple(in, at, r);
     }
+}
+
+bool element_reader::fast_real(window& in, const char* at, const row& r) {
+    double value = 0;
+    at += r.name->length;
+    if (at[-1] != '>') return false;
+    at = parse_real(in, at, r.rules, '<', value);
+    if (at == nullptr || (at = close_tag(in, at, *r.name)) == nullptr) return false;
+    member_at<double>(object_, r.value) = value;
+    return value_read(in, at, r);
 }
 
 bool element_reader::fast_simple(window& in, const char* at, const row& r) {
@@ -162,9 +190,14 @@ bool element_reader::fast_simple(window& in, const char* at, const row& r) {
     if (at[-1] != '>') return false;
     at = parse_content(in, at, r.what, r.rules, *r.name, value);
     if (at == nullptr || !store_value(value, r.what, r.rules, &member_at<char>(object_, r.value))) return false;
+    return value_read(in, at, r);
+}
+
+/// Behind a simple child whose value is stored.
+bool element_reader::value_read(window& in, const char* at, const row& r) {
     in.p = at;
     member_at<bool>(object_, r.flag) = true;
-    remember_value(*r.name, whitespace_of(r.what, r.rules));
+    remember_value(r);
     return true;
 }
 
@@ -176,17 +209,25 @@ bool element_reader::fast_text_item(window& in, const char* at, const row& r) {
     if (at == nullptr) return false;
     auto& items = member_at<list_base>(object_, r.value);
     items.make_room();
-    if (r.what == kind::text_list) {
-        auto* const item = make_object<std::wstring>();
-        items.append(item);
-        store_value(value, r.what, r.rules, item);
-    } else {
-        lmx::c_datetime moment;
-        if (!store_value(value, r.what, r.rules, &moment)) return false;
-        items.append(make_object<lmx::c_datetime>(moment));
-    }
+    auto* const item = make_object<std::wstring>();
+    items.append(item);
+    store_value(value, r.what, r.rules, item);
     in.p = at;
-    remember_value(*r.name, whitespace_of(r.what, r.rules));
+    remember_value(r);
+    return true;
+}
+
+bool element_reader::fast_moment_item(window& in, const char* at, const row& r) {
+    lmx::c_datetime moment;
+    at += r.name->length;
+    if (at[-1] != '>') return false;
+    at = parse_moment(in, at, '<', moment);
+    if (at == nullptr || (at = close_tag(in, at, *r.name)) == nullptr) return false;
+    auto& items = member_at<list_base>(object_, r.value);
+    items.make_room();
+    items.append(make_object<lmx::c_datetime>(moment));
+    in.p = at;
+    remember_value(r);
     return true;
 }
 
@@ -199,14 +240,6 @@ bool element_reader::fast_object(window& in, const char* at, const row& r) {
     parsed_start start;
     at = parse_start(in, at, *r.type, *r.name, object, start);
     if (at == nullptr || (!start.complete && is_too_deep())) return false;
-    if (r.what == kind::child_list) {
-        auto& items = member_at<list_base>(object_, r.value);
-        items.make_room();
-        object = r.type->create();
-        items.append(object);
-        in.p = at;
-        return enter(start, *r.type, *r.name, object);
-    }
     if (object == nullptr) {
         auto& held = member_at<pointer_member>(object_, r.value);
         if (start.nil) {
@@ -221,6 +254,32 @@ bool element_reader::fast_object(window& in, const char* at, const row& r) {
     if (!enter(start, *r.type, *r.name, object)) return false;
     member_at<bool>(object_, r.flag) = true;
     return true;
+}
+
+bool element_reader::fast_item(window& in, const char* at, const row& r) {
+    const class_rows& rows = *r.type;
+    auto& items = member_at<list_base>(object_, r.value);
+    items.make_room();
+    new_object item(rows);
+    new_start start;
+    at = read_start(in, at, rows, *r.name, item.get(), start);
+    if (at == nullptr || (!start.complete && is_too_deep())) return false;
+    void* const object = item.release();
+    items.append(object);
+    in.p = at;
+    fast_trace& trace = reader_access::trace(reader_);
+    if (start.last_attribute == nullptr) {
+        trace.kind = name_kind::element;
+        trace.name = r.name;
+    } else {
+        trace = {name_kind::attribute, start.last_attribute->attribute, start.last_attribute};
+    }
+    if (start.complete) {
+        trace.value = rows.rows;
+        return true;
+    }
+    error_ = element_reader(rows, object, reader_).entered(*r.name);
+    return error_ == lmx::err_no_error;
 }
 
 bool element_reader::fast_member(window& in, const char* at, const row& r, int member) {
@@ -254,8 +313,7 @@ bool element_reader::fast_head(window& in, const char* at, const row& r) {
     void* const made = rows.create();
     hold_member(group_rows, group, 0, made);
     in.p = at;
-    fast_trace& trace = reader_access::trace(reader_);
-    trace = {"xsi:type", fast_trace::name_kind::xsi, true, lmx::preserve};
+    reader_access::trace(reader_) = {name_kind::type, nullptr, &type_row};
     error_ = element_reader(rows, made, reader_).entered(name);
     if (error_ != lmx::err_no_error) return false;
     if (r.what != kind::group_list) member_at<bool>(object_, r.flag) = true;
@@ -283,7 +341,8 @@ bool element_reader::is_too_deep() const {
 }
 
 bool element_reader::fast_option() {
-    const auto [in, tag] = tag_place(reader_);
+    window* const in = reader_access::begin_element(reader_);
+    const char* const tag = in == nullptr ? nullptr : next_tag(*in);
     if (tag == nullptr) return false;
     int index = 0;
     while (index < rows_.row_count && !starts(tag, *rows_.rows[index].name))
@@ -308,7 +367,7 @@ bool element_reader::fast_option() {
         choose_option(rows_, object_, index);
         in->p = at;
         store_value(value, option.what, option.rules, option.what == kind::text ? slot.object : &slot.real);
-        remember_value(*option.name, whitespace_of(option.what, option.rules));
+        remember_value(option);
     }
     begun_ = true;
     last_row_ = 0;

@@ -23,12 +23,20 @@ inline constexpr char layout_newline[] = "\n";
 /// Writes to a file that is truncated first and deleted after a failure. 1 if it can't be opened, 42 if the stream
 /// failed in a write that was otherwise complete.
 lmx::elmx_error write_file(const char* file_name, void* object, const char* name, write_call write);
-/// Assigns to `*out` when the code is 0.
-lmx::elmx_error write_string(std::string* out, void* object, const char* name, write_call write);
+/// Assigns to `*out` when the code is 0. `text_size`, if there is one, holds what to expect, and then the size.
+lmx::elmx_error write_string(std::string* out, void* object, const char* name, write_call write,
+                             std::size_t* text_size);
+/// The same as wide text.
+lmx::elmx_error write_string(std::wstring* out, void* object, const char* name, write_call write,
+                             std::size_t* text_size);
 lmx::elmx_error write_stream(std::ostream& stream, void* object, const char* name, write_call write);
 
 /// Reads up to the root's name and compares it. Returns 0, 16, or the reader's code, through the reader's handler.
 lmx::elmx_error read_root(lmx::c_xml_reader& reader, const char* local_name);
+/// Promises that the bytes that a reader reads lie in memory that outlives it.
+void note_lasting_source(lmx::c_xml_reader& reader);
+/// How many bytes of its source a reader has read.
+std::size_t size_read(lmx::c_xml_reader& reader);
 
 template<class model_class>
 lmx::elmx_error call_marshal(void* object, lmx::c_xml_writer& writer, const char* name) {
@@ -40,8 +48,9 @@ lmx::elmx_error marshal_to_file(model_class& object, const char* name, const cha
     return write_file(file_name, &object, name, call_marshal<model_class>);
 }
 template<class model_class>
-lmx::elmx_error marshal_to_string(model_class& object, const char* name, std::string* out) {
-    return write_string(out, &object, name, call_marshal<model_class>);
+lmx::elmx_error marshal_to_string(model_class& object, const char* name, std::string* out,
+                                  std::size_t* text_size = nullptr) {
+    return write_string(out, &object, name, call_marshal<model_class>, text_size);
 }
 template<class model_class>
 lmx::elmx_error marshal_to_stream(model_class& object, const char* name, std::ostream& stream) {
@@ -49,11 +58,14 @@ lmx::elmx_error marshal_to_stream(model_class& object, const char* name, std::os
 }
 
 template<class model_class>
-lmx::elmx_error unmarshal_document(model_class& object, lmx::c_xml_reader& reader, const char* local_name) {
+lmx::elmx_error unmarshal_document(model_class& object, lmx::c_xml_reader& reader, const char* local_name,
+                                   std::size_t* text_size = nullptr) {
     reader.set_ns_map(namespace_map);
     const lmx::c_xml_reader_local scope(&reader);
-    const lmx::elmx_error error = read_root(reader, local_name);
-    return error != lmx::err_no_error ? error : object.unmarshal(reader, reader.item_name);
+    lmx::elmx_error error = read_root(reader, local_name);
+    if (error == lmx::err_no_error) error = object.unmarshal(reader, reader.item_name);
+    if (text_size != nullptr) *text_size = size_read(reader);
+    return error;
 }
 template<class model_class>
 lmx::elmx_error unmarshal_file(model_class& object, const char* file_name) {
@@ -63,6 +75,7 @@ lmx::elmx_error unmarshal_file(model_class& object, const char* file_name) {
 template<class model_class>
 lmx::elmx_error unmarshal_memory(model_class& object, const char* data, unsigned int size) {
     lmx::c_xml_reader_memory reader(data, size);
+    note_lasting_source(reader);
     return object.unmarshal(reader);
 }
 /// Through a source of its own, which has no limit of 4 GiB.
@@ -70,6 +83,7 @@ template<class model_class>
 lmx::elmx_error unmarshal_text(model_class& object, const std::string& text) {
     lmx::c_read_string source(text);
     lmx::c_xml_reader reader(source);
+    note_lasting_source(reader);
     return object.unmarshal(reader);
 }
 

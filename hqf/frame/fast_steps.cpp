@@ -14,19 +14,6 @@ namespace hqf::frame {
 
 namespace {
 
-/// The longest text of a number in its short form, and some more.
-constexpr std::size_t number_room = 48;
-
-const char* parse_real(window& in, const char* at, const facets* rules, char stop, double& value) {
-    if (!in.room(at, number_room)) return nullptr;
-    const char* end = scan_short_decimal(at, value);
-    if (end == nullptr || *end != stop) {
-        end = scan_double(at, in.edge(), value);
-        if (end == nullptr || end == in.edge() || *end != stop) return nullptr;
-    }
-    return rules == nullptr || check_range(value, *rules, true) == lmx::err_no_error ? end : nullptr;
-}
-
 const char* take_text(window& in, const char* at, char stop, parsed_value& value) {
     const char* const end = in.find(at, stop);
     value.begin = at;
@@ -144,10 +131,17 @@ bool is_set(const row& r, const void* object) {
     return object != nullptr && member_at<bool>(object, r.flag);
 }
 
+bool read_moment(const parsed_value& value, lmx::c_datetime& moment) {
+    lmx::c_datetime read;
+    if (scan_zoned_datetime(value.begin, value.end(), read) != value.end()) return false;
+    moment = read;
+    return true;
+}
+
 /// Attributes are stored together, so each must be known to be good before the first is.
 bool is_storable(const parsed_value& value, const row& r) {
     lmx::c_datetime moment;
-    return r.what != kind::moment || read_zoned_datetime(value.begin, value.end(), moment);
+    return r.what != kind::moment || read_moment(value, moment);
 }
 
 const char* parse_attributes(window& in, const char* at, const class_rows& rows, const void* object,
@@ -189,6 +183,23 @@ const char* parse_nil(window& in, const char* at) {
 
 } // namespace
 
+const char* scan_real(window& in, const char* at, char stop, double& value) {
+    // The longest text of a number in its short form, and some more.
+    constexpr std::size_t number_room = 48;
+    if (!in.room(at, number_room)) return nullptr;
+    const char* end = scan_short_decimal(at, value);
+    if (end != nullptr && *end == stop) return end;
+    end = scan_double(at, in.edge(), value);
+    return end != nullptr && end != in.edge() && *end == stop ? end : nullptr;
+}
+
+const char* parse_moment(window& in, const char* at, char stop, lmx::c_datetime& moment) {
+    constexpr std::size_t moment_room = 48;
+    if (!in.room(at, moment_room)) return nullptr;
+    const char* const end = scan_zoned_datetime(at, in.edge(), moment);
+    return end != nullptr && end != in.edge() && *end == stop ? end : nullptr;
+}
+
 const char* parse_value(window& in, const char* at, kind what, const facets* rules, char stop, parsed_value& value) {
     // Most values of a large document are numbers.
     if (what == kind::real) return parse_real(in, at, rules, stop, value.real);
@@ -200,8 +211,7 @@ const char* parse_value(window& in, const char* at, kind what, const facets* rul
     case kind::text:
     case kind::enumerated:
     case kind::text_list: return parse_text(in, at, rules, stop, value);
-    case kind::moment:
-    case kind::moment_list: return take_text(in, at, stop, value);
+    case kind::moment: return take_text(in, at, stop, value);
     case kind::boolean:
         end = take_text(in, at, stop, value);
         return end != nullptr && read_bool(at, end, value.truth) ? end : nullptr;
@@ -224,9 +234,7 @@ bool store_value(const parsed_value& value, kind what, const facets* rules, void
     case kind::natural: *static_cast<unsigned int*>(member) = static_cast<unsigned int>(value.whole); break;
     case kind::octet: *static_cast<unsigned char*>(member) = static_cast<unsigned char>(value.whole); break;
     case kind::boolean: *static_cast<bool*>(member) = value.truth; break;
-    case kind::moment:
-    case kind::moment_list:
-        return read_zoned_datetime(value.begin, value.end(), *static_cast<lmx::c_datetime*>(member));
+    case kind::moment: return read_moment(value, *static_cast<lmx::c_datetime*>(member));
     case kind::binary: static_cast<lmx::c_binary*>(member)->from_base64(std::string(value.begin, value.size)); break;
     default:
         if (value.literal != 0)
@@ -238,8 +246,8 @@ bool store_value(const parsed_value& value, kind what, const facets* rules, void
     return true;
 }
 
-const char* parse_start(window& in, const char* at, const class_rows& rows, const element_name& name,
-                        const void* object, parsed_start& start) {
+const char* parse_full_start(window& in, const char* at, const class_rows& rows, const element_name& name,
+                             const void* object, parsed_start& start) {
     at += name.length - 1;
     if (rows.nil != 0) {
         if (const char* const end = parse_nil(in, at)) {
@@ -249,17 +257,57 @@ const char* parse_start(window& in, const char* at, const class_rows& rows, cons
         // An object that is nil from before would not read its content.
         if (object != nullptr && rows.is_nil(object)) return nullptr;
     }
-    if (rows.attribute_count != 0) {
+    if (*at == ' ' || rows.needed_attributes != 0) {
         at = parse_attributes(in, at, rows, object, start);
         if (at == nullptr || (rows.needed_attributes != 0 && !has_mandatory_attributes(rows, object, start)))
             return nullptr;
+        if (!in.room(at, 1)) return nullptr;
     }
-    if (!in.room(at, 1) || *at != '>') return nullptr;
+    if (*at != '>') return nullptr;
     ++at;
     if (rows.shape != form::simple_content) return at;
     start.complete = true;
     const row& body = *rows.rows;
     return parse_content(in, at, body.what, body.rules, name, start.body);
+}
+
+namespace {
+
+/// Reads a value into a member that nobody has seen yet.
+const char* read_value(window& in, const char* at, const row& r, char stop, void* object) {
+    if (r.what == kind::real) return parse_real(in, at, r.rules, stop, member_at<double>(object, r.value));
+    parsed_value value;
+    at = parse_value(in, at, r.what, r.rules, stop, value);
+    return at != nullptr && store_value(value, r.what, r.rules, &member_at<char>(object, r.value)) ? at : nullptr;
+}
+
+} // namespace
+
+const char* read_start(window& in, const char* at, const class_rows& rows, const element_name& name, void* object,
+                       new_start& start) {
+    at += name.length - 1;
+    const row* next = rows.attributes;
+    const row* const end = next + rows.attribute_count;
+    std::uint32_t missing = rows.needed_attributes;
+    while (*at == ' ') {
+        while (next != end && !same_text(at, next->attribute->open, next->attribute->length))
+            ++next;
+        if (next == end) return nullptr;
+        at = read_value(in, at + next->attribute->length, *next, '"', object);
+        if (at == nullptr || !in.room(++at, longest_name_room)) return nullptr;
+        member_at<bool>(object, next->flag) = true;
+        missing &= ~(std::uint32_t{1} << (next - rows.attributes));
+        start.last_attribute = next++;
+    }
+    if (*at != '>' || missing != 0) return nullptr;
+    ++at;
+    if (rows.shape != form::simple_content) return at;
+    start.complete = true;
+    const row& body = *rows.rows;
+    at = read_value(in, at, body, '<', object);
+    if (at == nullptr || (at = close_tag(in, at, name)) == nullptr) return nullptr;
+    member_at<bool>(object, body.flag) = true;
+    return at;
 }
 
 void store_start(const parsed_start& start, const class_rows& rows, void* object) {

@@ -68,9 +68,6 @@ struct thread_pools {
     void give_back(slot* freed);
     void collect();
     void give_back_from_elsewhere(slot* freed);
-
-private:
-    slot* take_from_another_block(pool& from, std::size_t granules);
 };
 
 constinit std::mutex lock;
@@ -124,14 +121,9 @@ void add_block(thread_pools* owner, pool& to, std::size_t granules) {
     to.next_block_size = std::min<unsigned int>(to.next_block_size * 2, largest_block_size);
 }
 
+/// A slot where the first block with room has none.
 slot* thread_pools::take(std::size_t granules) {
     pool& from = by_granules[granules];
-    if (from.with_room != nullptr)
-        if (slot* const taken = take_from(*from.with_room)) return taken;
-    return take_from_another_block(from, granules);
-}
-
-slot* thread_pools::take_from_another_block(pool& from, std::size_t granules) {
     collect();
     for (;;) {
         if (from.with_room == nullptr) add_block(this, from, granules);
@@ -201,20 +193,31 @@ thread_pools* pools_of_this_thread() {
     return own_pools;
 }
 
-} // namespace
+[[gnu::noinline]] void* take_slowly(thread_pools& from, std::size_t granules) {
+    return from.take(granules)->object();
+}
 
-void* pooled::operator new(std::size_t size) {
-    if constexpr (!HQF_POOLS) return ::operator new(size);
-    const std::size_t granules = granules_of(size);
-    thread_pools* pools = own_pools;
-    if (pools == nullptr) pools = pools_of_this_thread();
-    if (pools != nullptr && size <= largest_object) return pools->take(granules)->object();
-
+/// The first object of a thread, and objects too large for a slot.
+[[gnu::noinline]] void* allocate_slowly(std::size_t size) {
+    thread_pools* const pools = pools_of_this_thread();
+    if (pools != nullptr && size <= largest_object) return take_slowly(*pools, granules_of(size));
     slot* const alone = static_cast<slot*>(::operator new(size + granule));
     // As in a block, the object lies on 16 bytes, with the word about its home before it.
     void* const object = reinterpret_cast<char*>(alone) + granule;
     slot::of(object)->home = nullptr;
     return object;
+}
+
+} // namespace
+
+void* pooled::operator new(std::size_t size) {
+    if constexpr (!HQF_POOLS) return ::operator new(size);
+    // Nothing but the slow ways needs registers kept.
+    if (own_pools == nullptr || size > largest_object) return allocate_slowly(size);
+    const std::size_t granules = granules_of(size);
+    block* const room = own_pools->by_granules[granules].with_room;
+    slot* const taken = room == nullptr ? nullptr : take_from(*room);
+    return taken != nullptr ? taken->object() : take_slowly(*own_pools, granules);
 }
 
 void* pooled::operator new(std::size_t size, const std::nothrow_t&) noexcept {

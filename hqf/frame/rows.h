@@ -9,6 +9,7 @@
 #include <cstddef>
 #include <cstdint>
 #include <string>
+#include <string_view>
 
 #include "hqf/errors/elmx_error.h"
 #include "hqf/frame/storage.h"
@@ -40,10 +41,13 @@ struct alignas(16) element_name {
     /// Length of `open`, both brackets included.
     std::uint8_t length;
     /// The number that event tables give the name.
-    std::int32_t event;
+    std::int16_t event;
+    /// A bit for each of the first 16 bytes of `open` that belong to "<Hqf:Name".
+    std::uint32_t first_bytes = length > 16 ? 0xFFFF : (1u << (length - 1)) - 1;
 
-    /// "Hqf:Name"
-    std::string qualified() const { return std::string(open + 1, length - 2u); }
+    /// "Hqf:Name", padded too.
+    std::string_view text() const { return {open + 1, length - 2u}; }
+    std::string qualified() const { return std::string(text()); }
 };
 
 /// An attribute's name as it stands in a start tag.
@@ -150,13 +154,22 @@ struct row {
 };
 static_assert(sizeof(row) == 40);
 
-/// A bit for each row that must be there before an object can be written.
+/// A bit for each row that is mandatory.
 template<std::size_t count>
-constexpr std::uint32_t needed(const row (&rows)[count]) {
+constexpr std::uint32_t mandatory_among(const row (&rows)[count]) {
     static_assert(count <= 32);
     std::uint32_t bits = 0;
     for (std::size_t i = 0; i < count; ++i)
-        if (rows[i].has(mandatory_row) && !rows[i].has(not_counted)) bits |= std::uint32_t{1} << i;
+        if (rows[i].has(mandatory_row)) bits |= std::uint32_t{1} << i;
+    return bits;
+}
+
+/// A bit for each row that must be there before an object can be written.
+template<std::size_t count>
+constexpr std::uint32_t needed(const row (&rows)[count]) {
+    std::uint32_t bits = mandatory_among(rows);
+    for (std::size_t i = 0; i < count; ++i)
+        if (rows[i].has(not_counted)) bits &= ~(std::uint32_t{1} << i);
     return bits;
 }
 
@@ -219,6 +232,8 @@ struct class_rows {
     /// What is_occurs_ok() asks for: a bit for each attribute, and for each row.
     std::uint32_t needed_attributes = 0;
     std::uint32_t needed_rows = 0;
+    /// What a reader asks for: a bit for each row.
+    std::uint32_t mandatory_rows = 0;
 
     std::uint8_t attribute_count = 0;
     /// Children; the body of a class with simple content; the options of a choice.

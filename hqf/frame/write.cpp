@@ -1,5 +1,7 @@
 #include "hqf/frame/write.h"
 
+#include <cstring>
+
 #include "hqf/frame/objects.h"
 #include "hqf/xml_out/output.h"
 
@@ -20,252 +22,238 @@ struct tag {
         , length(size) {}
 };
 
-/// One write. Codes come back through every enclosing element, which then leaves out its end tag.
+/// One write. Its steps take the place where the text goes and give the one behind, or null after an error: then every
+/// enclosing element leaves out its end tag, and what was gathered is on the stream already.
 class element_writer {
 public:
     explicit element_writer(lmx::c_xml_writer& writer)
         : out_(writer) {}
 
-    lmx::elmx_error element(const class_rows& rows, void* object, const tag& name);
-    void attributes(const class_rows& rows, const void* object);
-    lmx::elmx_error content(const class_rows& rows, void* object);
-    lmx::elmx_error group(const class_rows& rows, void* object);
+    lmx::elmx_error element(const class_rows& rows, void* object, const tag& name) {
+        return ended(element(out_.begin(), rows, object, name));
+    }
+    void attributes(const class_rows& rows, const void* object) { out_.flush(attributes(out_.begin(), rows, object)); }
+    lmx::elmx_error content(const class_rows& rows, void* object) { return ended(content(out_.begin(), rows, object)); }
+    lmx::elmx_error group(const class_rows& rows, void* object) { return ended(group(out_.begin(), rows, object)); }
 
 private:
     lmx::c_xml_writer& writer() { return out_.writer(); }
+    lmx::elmx_error ended(const char* at) {
+        if (at != nullptr) out_.flush(at);
+        return error_;
+    }
+    char* failed(const char* at, lmx::elmx_error error) {
+        out_.flush(at);
+        error_ = error;
+        return nullptr;
+    }
 
-    void start(const class_rows& rows, const tag& name);
-    void nil_end();
-    void type_attribute(const class_rows& rows);
-    void attribute(const row& r, const void* object);
-    lmx::elmx_error choice(const class_rows& rows, void* object);
-    lmx::elmx_error child(const row& r, void* object);
-    lmx::elmx_error group_member(const class_rows& rows, int chosen, void* object);
-    lmx::elmx_error bad_selector(const class_rows& rows);
-    void list(const row& r, const list_base& items);
-    bool stored_value(const row& r, const void* object);
-    void literal(const enumerated& value, const literals& texts);
-    void option_value(const row& r, const choice_slot& slot);
+    char* element(char* at, const class_rows& rows, void* object, const tag& name);
+    char* attributes(char* at, const class_rows& rows, const void* object);
+    char* content(char* at, const class_rows& rows, void* object);
+    char* group(char* at, const class_rows& rows, void* object);
+    char* start(char* at, const class_rows& rows, const tag& name);
+    char* nil_end(char* at);
+    char* type_attribute(char* at, const class_rows& rows);
+    char* choice(char* at, const class_rows& rows, void* object);
+    char* child(char* at, const row& r, void* object);
+    char* bad_selector(const char* at, const class_rows& rows);
+    char* list(char* at, const row& r, const list_base& items);
+    char* any_items(char* at, const list_base& items);
+    char* stored_value(char* at, const row& r, const void* object);
+    char* literal(char* at, const enumerated& value, const literals& texts);
 
     template<class value_type>
-    void simple(const element_name& name, const value_type& value) {
-        const tag around(name);
-        out_.indent();
-        out_.padded(around.open, around.length);
-        out_.value(value);
-        end_tag(around);
+    char* simple(char* at, const element_name& name, const value_type& value) {
+        return end_tag(out_.value(start_tag(at, tag(name)), value), tag(name));
     }
-    void end_tag(const tag& name) {
-        out_.character('<');
-        out_.character('/');
-        out_.padded(name.open + 1, name.length - 1);
-        out_.line_end();
+    char* start_tag(char* at, const tag& name) {
+        return out_.padded(out_.indent(out_.room(at)), name.open, name.length);
+    }
+    char* end_tag(char* at, const tag& name) {
+        std::memcpy(at, "</", 2);
+        return out_.line_end(out_.padded(at + 2, name.open + 1, name.length - 1));
     }
 
     output out_;
+    lmx::elmx_error error_ = lmx::err_no_error;
 };
 
-void element_writer::start(const class_rows& rows, const tag& name) {
-    out_.indent();
-    out_.padded(name.open, name.length - 1);
+char* element_writer::start(char* at, const class_rows& rows, const tag& name) {
+    at = out_.padded(out_.indent(out_.room(at)), name.open, name.length - 1);
     if (rows.writes_namespaces) {
         writer().conditionally_select_ns_map(namespace_map);
         if (!writer_access::ns_attrs_written(writer())) {
-            out_.flush();
+            out_.flush(at);
             writer().conditionally_write_ns_attrs(true);
+            at = out_.begin();
         }
     }
+    return at;
 }
 
 /// Ends the start tag of a nil element, and with it the element.
-void element_writer::nil_end() {
-    static constexpr char nil[] = " xsi:nil=\"true\"/>";
-    out_.text(nil, sizeof(nil) - 1);
-    out_.line_end();
+char* element_writer::nil_end(char* at) {
+    static constexpr char nil[32] = " xsi:nil=\"true\"/>";
+    return out_.line_end(out_.padded(at, nil, 17));
 }
 
-void element_writer::type_attribute(const class_rows& rows) {
+char* element_writer::type_attribute(char* at, const class_rows& rows) {
     const char* expected = writer().get_expected_class_identity();
-    if (expected == nullptr || expected == *rows.id) return;
-    const std::string text = " xsi:type=\"Hqf:" + std::string(rows.name) + '"';
-    out_.text(text.data(), text.size());
+    if (expected == nullptr || expected == *rows.id) return at;
+    static constexpr char begin[] = " xsi:type=\"Hqf:";
+    at = out_.text(at, begin, sizeof begin - 1);
+    at = out_.text(at, rows.name, std::strlen(rows.name));
+    at = out_.room(at);
+    *at = '"';
     writer().clear_expected_class_identity();
+    return at + 1;
 }
 
-lmx::elmx_error element_writer::element(const class_rows& rows, void* object, const tag& name) {
-    if (!is_occurs_ok(rows, object)) return lmx::err_min_max_occurs_error_on_marshaling;
-    start(rows, name);
+char* element_writer::element(char* at, const class_rows& rows, void* object, const tag& name) {
+    if (!is_occurs_ok(rows, object)) return failed(at, lmx::err_min_max_occurs_error_on_marshaling);
+    at = start(at, rows, name);
     if (rows.is_nil(object)) {
-        if (rows.attributes_when_nil) attributes(rows, object);
-        nil_end();
-        return lmx::err_no_error;
+        if (rows.attributes_when_nil) at = attributes(at, rows, object);
+        return nil_end(out_.room(at));
     }
-    if (rows.id != nullptr) type_attribute(rows);
-    attributes(rows, object);
-    out_.character('>');
-    if (rows.shape == form::simple_content) {
-        content(rows, object);
-        end_tag(name);
-        return lmx::err_no_error;
-    }
-    out_.line_end();
+    if (rows.id != nullptr) at = type_attribute(at, rows);
+    if (rows.attribute_count != 0) at = attributes(at, rows, object);
+    at = out_.room(at);
+    *at++ = '>';
+    if (rows.shape == form::simple_content) return end_tag(content(at, rows, object), name);
+    at = out_.line_end(at);
     writer().indent();
-    const lmx::elmx_error error = content(rows, object);
-    if (error != lmx::err_no_error) return error;
+    at = content(at, rows, object);
+    if (at == nullptr) return nullptr;
     writer().undent();
-    out_.indent();
-    end_tag(name);
-    return lmx::err_no_error;
+    return end_tag(out_.indent(out_.room(at)), name);
 }
 
-void element_writer::attributes(const class_rows& rows, const void* object) {
-    for (unsigned int i = 0; i < rows.attribute_count; ++i) {
-        const row& r = rows.attributes[i];
-        if (r.has(mandatory_row) || r.has(always_written) || member_at<bool>(object, r.flag)) attribute(r, object);
+char* element_writer::attributes(char* at, const class_rows& rows, const void* object) {
+    for (const row* r = rows.attributes; r != rows.attributes + rows.attribute_count; ++r) {
+        if (!r->has(mandatory_row) && !r->has(always_written) && !member_at<bool>(object, r->flag)) continue;
+        at = out_.padded(out_.room(at), r->attribute->open, r->attribute->length);
+        at = stored_value(at, *r, object);
+        *at++ = '"';
     }
+    return at;
 }
 
-void element_writer::attribute(const row& r, const void* object) {
-    out_.padded(r.attribute->open, r.attribute->length);
-    stored_value(r, object);
-    out_.character('"');
-}
-
-/// Writes a single simple value as it is stored; false for a row that holds no such value.
-bool element_writer::stored_value(const row& r, const void* object) {
+/// Writes a single simple value as it is stored; behind it an end tag has room.
+char* element_writer::stored_value(char* at, const row& r, const void* object) {
     switch (r.what) {
-    case kind::text: out_.value(member_at<std::wstring>(object, r.value)); return true;
-    case kind::enumerated: literal(member_at<enumerated>(object, r.value), *r.rules->texts); return true;
-    case kind::real: out_.value(member_at<double>(object, r.value)); return true;
-    case kind::integer: out_.value(member_at<int>(object, r.value)); return true;
-    case kind::natural: out_.value(member_at<unsigned int>(object, r.value)); return true;
-    case kind::octet: out_.value(static_cast<unsigned int>(member_at<unsigned char>(object, r.value))); return true;
-    case kind::boolean: out_.value(member_at<bool>(object, r.value)); return true;
-    case kind::moment: out_.value(member_at<lmx::c_datetime>(object, r.value)); return true;
-    case kind::binary: out_.value(member_at<lmx::c_binary>(object, r.value)); return true;
-    default: return false;
+    case kind::real: return out_.value(at, member_at<double>(object, r.value));
+    case kind::text: return out_.value(at, member_at<std::wstring>(object, r.value));
+    case kind::enumerated: return literal(at, member_at<enumerated>(object, r.value), *r.rules->texts);
+    case kind::integer: return out_.value(at, member_at<int>(object, r.value));
+    case kind::natural: return out_.value(at, member_at<unsigned int>(object, r.value));
+    case kind::octet: return out_.value(at, static_cast<unsigned int>(member_at<unsigned char>(object, r.value)));
+    case kind::boolean: return out_.value(at, member_at<bool>(object, r.value));
+    case kind::moment: return out_.value(at, member_at<lmx::c_datetime>(object, r.value));
+    case kind::binary: return out_.value(at, member_at<lmx::c_binary>(object, r.value));
+    default: return at;
     }
 }
 
 /// No literal has a character that would be escaped.
-void element_writer::literal(const enumerated& value, const literals& texts) {
-    if (const int number = value.number(); number != 0)
-        out_.text(texts.narrow[number - 1], texts.lengths[number - 1]);
-    else
-        out_.value(value.text(texts));
+char* element_writer::literal(char* at, const enumerated& value, const literals& texts) {
+    const int number = value.number();
+    if (number == 0) return out_.value(at, value.text(texts));
+    return out_.room(out_.text(at, texts.narrow[number - 1], texts.lengths[number - 1]));
 }
 
-lmx::elmx_error element_writer::content(const class_rows& rows, void* object) {
+char* element_writer::content(char* at, const class_rows& rows, void* object) {
     switch (rows.shape) {
-    case form::choice: return choice(rows, object);
-    case form::group: return group(rows, object);
+    case form::choice: return choice(at, rows, object);
+    case form::group: return group(at, rows, object);
     case form::simple_content:
         // An optional body that is unset leaves the element empty.
-        if (rows.rows->has(mandatory_row) || member_at<bool>(object, rows.rows->flag)) stored_value(*rows.rows, object);
-        return lmx::err_no_error;
+        if (!rows.rows->has(mandatory_row) && !member_at<bool>(object, rows.rows->flag)) return at;
+        return stored_value(out_.room(at), *rows.rows, object);
     default: break;
     }
-    for (unsigned int i = 0; i < rows.row_count; ++i) {
-        const lmx::elmx_error error = child(rows.rows[i], object);
-        if (error != lmx::err_no_error) return error;
+    for (const row* r = rows.rows; r != rows.rows + rows.row_count && at != nullptr; ++r) {
+        if (r->is_list())
+            at = list(at, *r, member_at<list_base>(object, r->value));
+        else if (r->has(mandatory_row) || r->has(always_written) || member_at<bool>(object, r->flag))
+            at = child(at, *r, object);
     }
-    return lmx::err_no_error;
+    return at;
 }
 
-lmx::elmx_error element_writer::child(const row& r, void* object) {
-    void* member = &member_at<char>(object, r.value);
+char* element_writer::child(char* at, const row& r, void* object) {
     switch (r.what) {
-    case kind::text_list:
-    case kind::moment_list:
-    case kind::any_list: list(r, member_at<list_base>(object, r.value)); return lmx::err_no_error;
-    case kind::child_list:
-    case kind::group_list: {
-        const auto& items = member_at<list_base>(object, r.value);
-        for (unsigned int i = 0; i < items.size(); ++i) {
-            const lmx::elmx_error error = r.what == kind::group_list ? group(*r.type, items.item(i))
-                                                                     : element(*r.type, items.item(i), tag(*r.name));
-            if (error != lmx::err_no_error) return error;
-        }
-        return lmx::err_no_error;
-    }
-    default: break;
-    }
-    if (!r.has(mandatory_row) && !r.has(always_written) && !member_at<bool>(object, r.flag)) return lmx::err_no_error;
-    switch (r.what) {
-    case kind::child: return element(*r.type, member, tag(*r.name));
-    case kind::group: return group(*r.type, member);
+    case kind::child: return element(at, *r.type, &member_at<char>(object, r.value), tag(*r.name));
+    case kind::group: return group(at, *r.type, &member_at<char>(object, r.value));
     case kind::child_pointer:
     case kind::group_pointer: {
         const auto& held = member_at<pointer_member>(object, r.value);
         if (held.object != nullptr)
-            return r.what == kind::group_pointer ? group(*r.type, held.object)
-                                                 : element(*r.type, held.object, tag(*r.name));
-        if (!held.nil) return lmx::err_type_not_set;
-        start(*r.type, tag(*r.name));
-        nil_end();
-        return lmx::err_no_error;
+            return r.what == kind::group_pointer ? group(at, *r.type, held.object)
+                                                 : element(at, *r.type, held.object, tag(*r.name));
+        if (!held.nil) return failed(at, lmx::err_type_not_set);
+        return nil_end(start(at, *r.type, tag(*r.name)));
     }
-    default: break;
+    default: return end_tag(stored_value(start_tag(at, tag(*r.name)), r, object), tag(*r.name));
     }
-    const tag around(*r.name);
-    out_.indent();
-    out_.padded(around.open, around.length);
-    stored_value(r, object);
-    end_tag(around);
-    return lmx::err_no_error;
 }
 
-void element_writer::list(const row& r, const list_base& items) {
-    for (unsigned int i = 0; i < items.size(); ++i) {
-        const void* item = items.item(i);
-        if (r.what == kind::text_list) {
-            simple(*r.name, *static_cast<const std::wstring*>(item));
-        } else if (r.what == kind::moment_list) {
-            simple(*r.name, *static_cast<const lmx::c_datetime*>(item));
-        } else {
-            const std::string& raw = static_cast<const lmx::c_any_info*>(item)->get_value();
-            out_.indent();
-            out_.text(raw.data(), raw.size());
-            out_.line_end();
+char* element_writer::list(char* at, const row& r, const list_base& items) {
+    if (r.what == kind::any_list) return any_items(at, items);
+    for (unsigned int i = 0; i < items.size() && at != nullptr; ++i) {
+        void* const item = items.item(i);
+        switch (r.what) {
+        case kind::child_list: at = element(at, *r.type, item, tag(*r.name)); break;
+        case kind::group_list: at = group(at, *r.type, item); break;
+        case kind::text_list: at = simple(at, *r.name, *static_cast<const std::wstring*>(item)); break;
+        default: at = simple(at, *r.name, *static_cast<const lmx::c_datetime*>(item)); break;
         }
     }
+    return at;
 }
 
-lmx::elmx_error element_writer::choice(const class_rows& rows, void* object) {
+char* element_writer::any_items(char* at, const list_base& items) {
+    for (unsigned int i = 0; i < items.size(); ++i) {
+        const std::string& raw = static_cast<const lmx::c_any_info*>(items.item(i))->get_value();
+        at = out_.text(out_.indent(out_.room(at)), raw.data(), raw.size());
+        at = out_.line_end(out_.room(at));
+    }
+    return at;
+}
+
+char* element_writer::choice(char* at, const class_rows& rows, void* object) {
     const auto& slot = member_at<choice_slot>(object, rows.slot);
-    if (slot.chosen < 0 || slot.chosen >= rows.none()) return bad_selector(rows);
+    if (slot.chosen < 0 || slot.chosen >= rows.none()) return bad_selector(at, rows);
     const row& option = rows.rows[slot.chosen];
     switch (option.what) {
-    case kind::child: return element(*option.type, slot.object, tag(*option.name));
-    case kind::text: simple(*option.name, *static_cast<const std::wstring*>(slot.object)); break;
-    case kind::real: simple(*option.name, slot.real); break;
-    case kind::integer: simple(*option.name, slot.integer); break;
-    default: simple(*option.name, slot.natural); break;
+    case kind::child: return element(at, *option.type, slot.object, tag(*option.name));
+    case kind::text: return simple(at, *option.name, *static_cast<const std::wstring*>(slot.object));
+    case kind::real: return simple(at, *option.name, slot.real);
+    case kind::integer: return simple(at, *option.name, slot.integer);
+    default: return simple(at, *option.name, slot.natural);
     }
-    return lmx::err_no_error;
 }
 
-lmx::elmx_error element_writer::group(const class_rows& rows, void* object) {
+char* element_writer::group(char* at, const class_rows& rows, void* object) {
     const auto& slot = member_at<object_slot>(object, rows.slot);
-    if (slot.chosen == rows.none()) return lmx::err_min_max_occurs_error_on_marshaling;
-    if (slot.chosen < 0 || slot.chosen >= rows.member_count) return bad_selector(rows);
-    if (slot.object == nullptr) return lmx::err_type_not_set;
-    return group_member(rows, slot.chosen, slot.object);
-}
-
-lmx::elmx_error element_writer::group_member(const class_rows& rows, int chosen, void* object) {
-    const frame::group_member& member = rows.members[chosen];
-    const bool is_head = rows.calls->head_factory != nullptr && chosen == 0;
-    if (!is_head) return element(*member.type, object, tag(*member.name));
+    if (slot.chosen == rows.none()) return failed(at, lmx::err_min_max_occurs_error_on_marshaling);
+    if (slot.chosen < 0 || slot.chosen >= rows.member_count) return bad_selector(at, rows);
+    if (slot.object == nullptr) return failed(at, lmx::err_type_not_set);
+    const group_member& member = rows.members[slot.chosen];
+    const bool is_head = rows.calls->head_factory != nullptr && slot.chosen == 0;
+    if (!is_head) return element(at, *member.type, slot.object, tag(*member.name));
     // The head's object may be of any class of the hierarchy, the application's own included: it writes itself.
     writer().set_expected_class_identity(*rows.calls->head_id);
-    out_.flush();
-    return rows.calls->marshal(object, writer(), member.name->qualified().c_str());
+    out_.flush(at);
+    error_ = rows.calls->marshal(slot.object, writer(), member.name->qualified().c_str());
+    return error_ == lmx::err_no_error ? out_.begin() : nullptr;
 }
 
-lmx::elmx_error element_writer::bad_selector(const class_rows& rows) {
-    out_.flush();
-    return writer().handle_error(lmx::err_inappropriate_choice_option_selected, rows.item, "Hqf", __LINE__);
+char* element_writer::bad_selector(const char* at, const class_rows& rows) {
+    out_.flush(at);
+    error_ = writer().handle_error(lmx::err_inappropriate_choice_option_selected, rows.item, "Hqf", __LINE__);
+    return error_ == lmx::err_no_error ? out_.begin() : nullptr;
 }
 
 } // namespace

@@ -6,6 +6,7 @@
 #include <cstdint>
 #include <cstring>
 
+#include "hqf/values/digit_pairs.h"
 #include "hqf/values/eight_digits.h"
 #include "hqf/values/scan.h"
 #include "hqf/values/transcode.h"
@@ -70,10 +71,7 @@ char* put_padded(char* out, std::uint32_t value, int width) {
 }
 
 char* put_two(char* out, std::uint32_t value) {
-    if (value > 99) return put_padded(out, value, 2);
-    *out++ = static_cast<char>('0' + value / 10);
-    *out++ = static_cast<char>('0' + value % 10);
-    return out;
+    return value > 99 ? put_padded(out, value, 2) : put_pair(out, value);
 }
 
 char* put_seconds(char* out, char* limit, float secs) {
@@ -91,21 +89,21 @@ constexpr std::uint32_t magnitude(std::int32_t value) {
 
 } // namespace
 
-bool read_zoned_datetime(const char* begin, const char* end, lmx::c_datetime& value) {
-    if (end - begin <= common_size || !has_common_form(begin) || is_digit(begin[common_size])) return false;
+const char* scan_zoned_datetime(const char* begin, const char* end, lmx::c_datetime& value) {
+    if (end - begin <= common_size || !has_common_form(begin)) return nullptr;
 
-    const char* cursor = begin + 17; // the seconds, whose fraction has no fixed length
-    auto secs = static_cast<float>(two_digits(cursor));
-    if (begin[common_size] == '.')
+    const char* cursor = begin + common_size;
+    auto secs = static_cast<float>(two_digits(begin + 17));
+    if (*cursor == '.') {
+        cursor = begin + 17;
         lmx::scan_seconds(cursor, end, secs);
-    else
-        cursor = begin + common_size;
+    }
     std::int32_t offset = 0;
-    const bool is_utc = end - cursor == 1 && *cursor == 'Z';
+    const bool is_utc = cursor != end && *cursor == 'Z';
     if (!is_utc) {
-        if (end - cursor != 6 || (*cursor != '+' && *cursor != '-') || !is_digit(cursor[1]) || !is_digit(cursor[2]) ||
+        if (end - cursor < 6 || (*cursor != '+' && *cursor != '-') || !is_digit(cursor[1]) || !is_digit(cursor[2]) ||
             cursor[3] != ':' || !is_digit(cursor[4]) || !is_digit(cursor[5]))
-            return false;
+            return nullptr;
         offset = static_cast<std::int32_t>(two_digits(cursor + 1) * 60 + two_digits(cursor + 4));
         if (*cursor == '-') offset = -offset;
     }
@@ -118,7 +116,7 @@ bool read_zoned_datetime(const char* begin, const char* end, lmx::c_datetime& va
     value.secs = secs;
     value.total_offset_mins = offset;
     value.is_utc = is_utc;
-    return true;
+    return cursor + (is_utc ? 1 : 6);
 }
 
 zone_pattern match_zone_pattern(const char* begin, const char* end) {
@@ -139,7 +137,8 @@ zone_pattern match_zone_pattern(const char* begin, const char* end) {
 char* write_datetime(char* out, const lmx::c_datetime& value) {
     char* const limit = out + datetime_text_size;
     if (value.year < 0) *out++ = '-';
-    out = put_padded(out, magnitude(value.year), 4);
+    const std::uint32_t year = magnitude(value.year);
+    out = year > 9999 ? put_padded(out, year, 4) : put_pair(put_pair(out, year / 100), year % 100);
     *out++ = '-';
     out = put_two(out, value.month);
     *out++ = '-';

@@ -10,9 +10,9 @@ namespace hqf {
 
 /// Reads the common form YYYY-MM-DDThh:mm:ss with an optional fraction of seconds and a zone, "Z" or +hh:mm or -hh:mm.
 ///
-/// \returns true when the span has that form: it is then valid, matches the pattern `.+T.+(Z|[+\-].+)`, and is stored
-/// as assignment would. False says nothing about the text, and nothing is stored.
-bool read_zoned_datetime(const char* begin, const char* end, lmx::c_datetime& value);
+/// \returns the end of the form that begins here: it is then valid, matches the pattern `.+T.+(Z|[+\-].+)`, and is
+/// stored as assignment would. Null says nothing about the text, and nothing is stored.
+const char* scan_zoned_datetime(const char* begin, const char* end, lmx::c_datetime& value);
 
 /// Whether the span has the lexical form of a `c_datetime`, as `c_datetime::is_valid`.
 bool is_datetime(const char* begin, const char* end);

@@ -24,9 +24,18 @@ constexpr std::uint64_t differences(std::uint64_t eight, std::uint64_t form, std
     return ((difference + slack) | difference) & 0x8080808080808080;
 }
 
+/// A high bit in each byte that is no digit, up to the first of them that is not ASCII.
+constexpr std::uint64_t non_digits(std::uint64_t eight) {
+    return differences(eight, 0x3030303030303030, 0x7676767676767676);
+}
+/// The place of the first byte with a bit; 8 without any.
+constexpr unsigned int first_place(std::uint64_t bits) {
+    return static_cast<unsigned int>(std::countr_zero(bits)) / 8;
+}
+
 /// How many digits the eight characters begin with.
 constexpr unsigned int leading_digits(std::uint64_t eight) {
-    return static_cast<unsigned int>(std::countr_zero(differences(eight, 0x3030303030303030, 0x7676767676767676))) / 8;
+    return first_place(non_digits(eight));
 }
 
 /// The value of the first `count` characters, which are digits; from 1 to 8.

@@ -1,12 +1,13 @@
 #include "hqf/values/number_text.h"
 
-#include <array>
 #include <charconv>
 #include <cmath>
 #include <cstdint>
 #include <cstring>
 #include <locale>
 #include <ostream>
+
+#include "hqf/values/digit_pairs.h"
 
 namespace hqf {
 
@@ -25,21 +26,6 @@ const char* name_of(number value) {
     if (value == 0) return std::signbit(value) ? "-0.0" : "0.0";
     if (std::isinf(value)) return value < 0 ? "-INF" : "INF";
     return nullptr;
-}
-
-/// The digits of the numbers from 00 to 99.
-constexpr auto digit_pairs = [] {
-    std::array<char, 200> pairs{};
-    for (int i = 0; i < 100; ++i) {
-        pairs[static_cast<std::size_t>(2 * i)] = static_cast<char>('0' + i / 10);
-        pairs[static_cast<std::size_t>(2 * i + 1)] = static_cast<char>('0' + i % 10);
-    }
-    return pairs;
-}();
-
-char* put_pair(char* out, std::uint64_t value) {
-    std::memcpy(out, digit_pairs.data() + 2 * value, 2);
-    return out + 2;
 }
 
 char* put_digits(char* out, std::uint64_t value) {

@@ -7,6 +7,7 @@
 #include "hqf/values/lexical.h"
 #include "hqf/values/lexical_spans.h"
 #include "hqf/values/scan.h"
+#include "hqf/values/short_decimal.h"
 
 namespace hqf {
 
@@ -14,9 +15,6 @@ namespace {
 
 using lmx::is_digit;
 
-// Powers of ten that a double holds exactly: a quotient or product of two exact numbers is the nearest double.
-constexpr double exact_powers[] = {1e0,  1e1,  1e2,  1e3,  1e4,  1e5,  1e6,  1e7,  1e8,  1e9,  1e10, 1e11,
-                                   1e12, 1e13, 1e14, 1e15, 1e16, 1e17, 1e18, 1e19, 1e20, 1e21, 1e22};
 constexpr int largest_exact_power = 22;
 constexpr std::uint64_t exact_integers = std::uint64_t{1} << 53;
 constexpr std::uint64_t integer_powers[] = {1, 10, 100, 1000, 10000, 100000, 1000000, 10000000, 100000000};

@@ -4,6 +4,10 @@
 #include <cstdint>
 #include <cstring>
 
+#if defined(__SSE2__)
+#include <emmintrin.h>
+#endif
+
 #include "hqf/platform/pages.h"
 
 namespace hqf {
@@ -42,14 +46,14 @@ std::size_t wide_bound(const char* data, std::size_t size) {
 /// other half behind it.
 bool decode_one(const char*& in, const char* end, wchar_t*& out) {
     char32_t value = 0;
-    const std::size_t length = decode_sequence(in, end, value);
+    std::size_t length = decode_sequence(in, end, value);
     if (length == 0) return false;
-    in += length;
+    const char* const behind = in + length;
     if (is_high_surrogate(value)) {
         char32_t low = 0;
-        const std::size_t low_length = in < end ? decode_sequence(in, end, low) : 0;
+        const std::size_t low_length = behind < end ? decode_sequence(behind, end, low) : 0;
         if (low_length == 0 || !is_low_surrogate(low)) return false;
-        in += low_length;
+        length += low_length;
         *out++ = static_cast<wchar_t>(value);
         value = low;
     } else if (value > 0xFFFF) {
@@ -58,41 +62,57 @@ bool decode_one(const char*& in, const char* end, wchar_t*& out) {
         value = 0xDC00 + (value & 0x3FF);
     }
     *out++ = static_cast<wchar_t>(value);
+    in += length;
     return true;
 }
 
-bool is_ascii(const wchar_t* data, const wchar_t* end) {
-    std::uint32_t all = 0;
-    for (; data != end; ++data)
-        all |= static_cast<std::uint32_t>(*data);
-    return all < 0x80;
-}
-
-/// Encodes up to `stop`, and what is needed behind it for the last character.
-char* encode(const wchar_t*& in, const wchar_t* stop, const wchar_t* end, char* out) {
-    while (in < stop) {
-        char32_t c = to_character(*in++);
-        if (is_high_surrogate(c)) {
-            if (in < end && is_low_surrogate(static_cast<char32_t>(*in)))
-                c = join_surrogates(c, static_cast<char32_t>(*in));
-            if (in < end) ++in;
-        }
-        out = encode_utf8(c, out);
+/// Copies ASCII, sixteen elements at a time as long as all of them are.
+char* copy_ascii_runs(char* out, const char* limit, const wchar_t*& next, const wchar_t* end) {
+#if defined(__SSE2__)
+    static_assert(sizeof(wchar_t) == 4);
+    const wchar_t* at = next;
+    for (; end - at >= 16 && limit - out >= 16; at += 16, out += 16) {
+        const auto load = [at](int i) { return _mm_loadu_si128(reinterpret_cast<const __m128i*>(at + i)); };
+        // Packing keeps ASCII, and makes of everything else 0 or something above 127; 0 is left to the careful way.
+        const __m128i bytes = _mm_packus_epi16(_mm_packs_epi32(load(0), load(4)), _mm_packs_epi32(load(8), load(12)));
+        if (_mm_movemask_epi8(_mm_or_si128(bytes, _mm_cmpeq_epi8(bytes, _mm_setzero_si128()))) != 0) break;
+        _mm_storeu_si128(reinterpret_cast<__m128i*>(out), bytes);
     }
+    next = at;
+#else
+    static_cast<void>(limit);
+    static_cast<void>(next);
+    static_cast<void>(end);
+#endif
     return out;
 }
 
-/// Long texts go by way of a piece that stays in the cache: growing by resize() would have them written twice.
+/// Texts go by way of a piece that stays in the cache: a string that grows by resize() is written twice, and one that
+/// grows run by run is moved again and again.
 constexpr std::ptrdiff_t piece_size = 1024;
 
-void append_ascii(std::wstring& out, const char* data, std::size_t size) {
-    wchar_t piece[piece_size];
-    for (std::size_t count = 0; size != 0; data += count, size -= count) {
-        count = std::min<std::size_t>(size, piece_size);
-        for (std::size_t i = 0; i < count; ++i)
-            piece[i] = static_cast<wchar_t>(data[i]);
-        out.append(piece, count);
+/// Copies ASCII, eight bytes at a time as long as all of them are and there is room.
+void widen_ascii_runs(const char*& in, const char* end, wchar_t*& out, const wchar_t* limit) {
+#if defined(__SSE2__)
+    static_assert(sizeof(wchar_t) == 4);
+    const __m128i zero = _mm_setzero_si128();
+    const char* from = in;
+    wchar_t* to = out;
+    for (; end - from >= 8 && limit - to >= 8; from += 8, to += 8) {
+        const __m128i bytes = _mm_loadl_epi64(reinterpret_cast<const __m128i*>(from));
+        if (_mm_movemask_epi8(bytes) != 0) break;
+        const __m128i words = _mm_unpacklo_epi8(bytes, zero);
+        _mm_storeu_si128(reinterpret_cast<__m128i*>(to), _mm_unpacklo_epi16(words, zero));
+        _mm_storeu_si128(reinterpret_cast<__m128i*>(to + 4), _mm_unpackhi_epi16(words, zero));
     }
+    in = from;
+    out = to;
+#else
+    static_cast<void>(in);
+    static_cast<void>(end);
+    static_cast<void>(out);
+    static_cast<void>(limit);
+#endif
 }
 
 /// Room in one step for a long text that is about to come.
@@ -127,39 +147,60 @@ std::size_t decode_sequence(const char* in, const char* end, char32_t& value) {
     return length;
 }
 
-void append_wide(std::wstring& out, const char* data, std::size_t size) {
+const char* append_wide(std::wstring& out, const char* data, std::size_t size) {
+    constexpr std::ptrdiff_t careful_run = 8;
     const char* const end = data + size;
-    std::size_t run = ascii_run(data, size);
-    if (size > std::size_t{piece_size}) make_room(out, run + wide_bound(data + run, size - run));
-    for (;;) {
-        append_ascii(out, data, run);
-        data += run;
-        if (data == end) return;
-        wchar_t piece[piece_size];
-        wchar_t* to = piece;
-        bool good = true;
-        while (good && data != end && static_cast<unsigned char>(*data) >= 0x80 && to - piece < piece_size - 1)
-            good = decode_one(data, end, to);
-        out.append(piece, static_cast<std::size_t>(to - piece));
-        if (!good) return;
-        run = ascii_run(data, static_cast<std::size_t>(end - data));
+    if (size > std::size_t{piece_size}) {
+        const std::size_t run = ascii_run(data, size);
+        make_room(out, run + wide_bound(data + run, size - run));
     }
+    for (bool good = true; good && data != end;) {
+        wchar_t piece[piece_size];
+        const wchar_t* const limit = piece + piece_size - 1; // a character may give two
+        wchar_t* to = piece;
+        while (good && data != end && to < limit) {
+            widen_ascii_runs(data, end, to, limit);
+            const char* const stop = data + std::min(careful_run, end - data);
+            while (good && data < stop && to < limit) {
+                const auto byte = static_cast<unsigned char>(*data);
+                if (byte < 0x80) {
+                    *to++ = static_cast<wchar_t>(byte);
+                    ++data;
+                } else {
+                    good = decode_one(data, end, to);
+                }
+            }
+        }
+        out.append(piece, static_cast<std::size_t>(to - piece));
+    }
+    return data;
+}
+
+char* write_utf8(char* out, const char* limit, const wchar_t*& next, const wchar_t* end) {
+    constexpr std::ptrdiff_t longest_sequence = 4, careful_run = 16;
+    while (next != end && limit - out >= longest_sequence) {
+        out = copy_ascii_runs(out, limit, next, end);
+        const wchar_t* const stop = next + std::min(careful_run, end - next);
+        while (next < stop && limit - out >= longest_sequence) {
+            char32_t c = to_character(*next++);
+            if (is_high_surrogate(c) && next != end) {
+                if (is_low_surrogate(static_cast<char32_t>(*next)))
+                    c = join_surrogates(c, static_cast<char32_t>(*next));
+                ++next;
+            }
+            out = encode_utf8(c, out);
+        }
+    }
+    return out;
 }
 
 void append_utf8(std::string& out, const wchar_t* data, std::size_t size) {
-    constexpr std::ptrdiff_t longest = 4; // of a character's bytes
     const wchar_t* const end = data + size;
     if (size > std::size_t{piece_size}) make_room(out, size);
     while (data != end) {
-        char piece[longest * piece_size];
-        char* to = piece;
-        const wchar_t* const stop = data + std::min(end - data, piece_size);
-        if (is_ascii(data, stop))
-            for (; data != stop; ++data)
-                *to++ = static_cast<char>(*data);
-        else
-            to = encode(data, stop, end, piece);
-        out.append(piece, static_cast<std::size_t>(to - piece));
+        char piece[4 * piece_size];
+        const char* const filled = write_utf8(piece, piece + sizeof piece, data, end);
+        out.append(piece, static_cast<std::size_t>(filled - piece));
     }
 }
 

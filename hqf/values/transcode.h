@@ -8,8 +8,16 @@
 
 namespace hqf {
 
-/// Appends the UTF-16 form of `size` bytes of UTF-8.
-void append_wide(std::wstring& out, const char* data, std::size_t size);
+/// The most bytes that are read as one character: the two halves of a surrogate pair, encoded each for itself.
+inline constexpr std::size_t longest_character = 6;
+
+/// Appends the UTF-16 form of `size` bytes of UTF-8, up to a character that is none or is cut off. Gives the place that
+/// it got to.
+const char* append_wide(std::wstring& out, const char* data, std::size_t size);
+
+/// Writes the UTF-8 form of wide elements from `next` on, whole characters as far as they fit before `limit`, and moves
+/// `next` over them. Gives the end of what was written.
+char* write_utf8(char* out, const char* limit, const wchar_t*& next, const wchar_t* end);
 
 /// Appends the UTF-8 form of `size` wide elements.
 void append_utf8(std::string& out, const wchar_t* data, std::size_t size);

@@ -62,23 +62,41 @@ void append(std::string& out, const character* data, std::size_t size) {
 
 #if defined(__SSE2__)
 
+/// Eight elements as bytes, and whether each is ASCII that stands for itself.
+struct eight_elements {
+    __m128i bytes;
+    bool are_plain;
+
+    explicit eight_elements(const wchar_t* at) {
+        static_assert(sizeof(wchar_t) == 4);
+        const auto load = [](const wchar_t* from) { return _mm_loadu_si128(reinterpret_cast<const __m128i*>(from)); };
+        const auto is = [this](char c) { return _mm_cmpeq_epi8(bytes, _mm_set1_epi8(c)); };
+        // Packing keeps ASCII, and makes of everything else 0 or a byte above 127.
+        const __m128i words = _mm_packs_epi32(load(at), load(at + 4));
+        bytes = _mm_packus_epi16(words, words);
+        const __m128i special =
+            _mm_or_si128(_mm_or_si128(is('"'), is('\'')), _mm_or_si128(_mm_or_si128(is('&'), is('<')), is(0)));
+        are_plain = _mm_movemask_epi8(_mm_or_si128(special, bytes)) == 0;
+    }
+    void put(char* out) const { _mm_storel_epi64(reinterpret_cast<__m128i*>(out), bytes); }
+};
+
 /// Copies eight elements at a time as long as all of them are ASCII that stands for itself.
 char* copy_plain_runs(char* out, const char* limit, const wchar_t*& next, const wchar_t* end) {
-    static_assert(sizeof(wchar_t) == 4);
-    const auto load = [](const wchar_t* at) { return _mm_loadu_si128(reinterpret_cast<const __m128i*>(at)); };
-    const auto is = [](__m128i bytes, char c) { return _mm_cmpeq_epi8(bytes, _mm_set1_epi8(c)); };
-    while (end - next >= 8 && limit - out >= 8) {
-        // Packing keeps ASCII, and makes of everything else 0 or a byte above 127.
-        const __m128i words = _mm_packs_epi32(load(next), load(next + 4));
-        const __m128i bytes = _mm_packus_epi16(words, words);
-        const __m128i special = _mm_or_si128(_mm_or_si128(is(bytes, '"'), is(bytes, '\'')),
-                                             _mm_or_si128(_mm_or_si128(is(bytes, '&'), is(bytes, '<')), is(bytes, 0)));
-        if (_mm_movemask_epi8(_mm_or_si128(special, bytes)) != 0) break;
-        _mm_storel_epi64(reinterpret_cast<__m128i*>(out), bytes);
-        out += 8;
-        next += 8;
+    const wchar_t* const begin = next;
+    for (; end - next >= 8; next += 8, out += 8) {
+        const eight_elements eight(next);
+        if (!eight.are_plain || limit - out < 8) return out;
+        eight.put(out);
     }
-    return out;
+    // The rest once more with elements before it, which are done.
+    const auto rest = end - next;
+    if (rest == 0 || next == begin || limit - out < rest) return out;
+    const eight_elements last(end - 8);
+    if (!last.are_plain) return out;
+    last.put(out + rest - 8);
+    next = end;
+    return out + rest;
 }
 
 #else

@@ -62,6 +62,19 @@ inline const char* skip_space(const char* from, const char* stop) {
 #endif
 }
 
+/// The same for up to 15 bytes of white space, of sixteen that can be read; null if there is more.
+inline const char* skip_short_space(const char* at) {
+#if defined(__SSE2__)
+    const __m128i bytes = _mm_loadu_si128(reinterpret_cast<const __m128i*>(at));
+    const auto above =
+        static_cast<unsigned>(_mm_movemask_epi8(_mm_or_si128(_mm_cmpgt_epi8(bytes, _mm_set1_epi8(' ')), bytes)));
+    return above != 0 ? at + static_cast<unsigned>(std::countr_zero(above)) : nullptr;
+#else
+    static_cast<void>(at);
+    return nullptr;
+#endif
+}
+
 /// How many lines end in a run: LF, CR, and CR LF once. `before` is the byte in front of it.
 long long count_line_ends(const char* from, const char* stop, unsigned char before);
 

@@ -2,6 +2,7 @@
 
 #include "hqf/xml_in/c_read_file.h"
 #include "hqf/xml_in/c_read_string.h"
+#include "hqf/xml_in/wide_source.h"
 #include "hqf/xml_in/window.h"
 
 #include <limits>
@@ -27,9 +28,11 @@ void c_get_as_utf8::attach() {
     if (type == typeid(c_read_memory) || type == typeid(c_read_string)) {
         source_ = memory_source;
         run_ = &static_cast<c_read_memory&>(input_).run_;
-    } else if (type == typeid(c_read_file)) {
-        source_ = file_source;
-        run_ = &static_cast<c_read_file&>(input_).run_;
+    } else if (type == typeid(c_read_file) || type == typeid(hqf::wide_source)) {
+        source_ = block_source;
+        blocks_ = type == typeid(c_read_file) ? &static_cast<c_read_file&>(input_).blocks_
+                                              : &static_cast<hqf::wide_source&>(input_).blocks;
+        run_ = &blocks_->run;
     } else {
         source_ = other_source;
     }
@@ -56,7 +59,7 @@ std::uint64_t c_get_as_utf8::bytes_read() const {
         const auto& memory = static_cast<const c_read_memory&>(input_);
         return static_cast<std::uint64_t>(memory.run_.cursor - memory.start_);
     }
-    case file_source: return static_cast<const c_read_file&>(input_).consumed();
+    case block_source: return blocks_->consumed();
     default: return virtual_reads_;
     }
 }
@@ -93,7 +96,7 @@ const char* c_get_as_utf8::get_source_id() const {
 }
 
 int c_get_as_utf8::get_line_num() const {
-    return window_ != nullptr && window_->is_open() ? window_->line() : line_;
+    return window_ != nullptr ? window_->line() : line_;
 }
 
 namespace {

@@ -9,6 +9,7 @@
 #include <string>
 
 namespace hqf {
+struct block_run;
 class window;
 struct reader_access;
 } // namespace hqf
@@ -75,7 +76,7 @@ private:
     enum encoding_state : int { undecided, single_byte, utf8, utf16_be, utf16_le, ucs2_be, ucs2_le };
     // The built-in sources are read through their byte_run; all others by one virtual call a byte. Found out at the
     // first read, since a source may be built after the reader that holds it.
-    enum source_kind : int { unknown_source, memory_source, file_source, other_source };
+    enum source_kind : int { unknown_source, memory_source, block_source, other_source };
 
     bool is_plain_next() const {
         return sequence_cursor_ == nullptr && state_ == utf8 && !run_->empty() &&
@@ -112,7 +113,10 @@ private:
     source_kind source_ = unknown_source;
     hqf::byte_run nothing_;
     hqf::byte_run* run_ = &nothing_;
+    hqf::block_run* blocks_ = nullptr;
     std::uint64_t virtual_reads_ = 0;
+    // The bytes lie in memory that outlives this object.
+    bool is_source_lasting_ = false;
     std::unique_ptr<hqf::window> window_;
 };
 

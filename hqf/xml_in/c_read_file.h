@@ -1,17 +1,11 @@
 #pragma once
 
-#include "hqf/xml_in/byte_run.h"
+#include "hqf/xml_in/block_run.h"
 #include "hqf/xml_in/c_read.h"
 
 #include <cstddef>
-#include <cstdint>
 #include <cstdio>
-#include <memory>
 #include <string>
-
-namespace hqf {
-class window;
-}
 
 namespace lmx {
 
@@ -33,7 +27,7 @@ public:
     ~c_read_file() override;
 
     bool is_open() const override { return file_ != nullptr; }
-    int read() override { return run_.empty() && !fill() ? -1 : run_.take(); }
+    int read() override { return blocks_.run.empty() && !fill() ? -1 : blocks_.run.take(); }
     const char* get_source_id() override { return source_id_.c_str(); }
     /// Back to offset 0 of the file. Precondition: the file is open.
     void rewind() override;
@@ -45,27 +39,16 @@ public:
 
 private:
     friend class c_get_as_utf8;
-    friend class hqf::window;
 
     bool fill();
-    // Where fewer than `wanted` unread bytes are at hand, brings them
-    // into one block of `block_size` and fills that from the file. Only for a file that was opened here: a caller's
-    // handle is never read ahead of the 512 bytes that `read` takes.
-    void read_ahead(std::size_t wanted, std::size_t block_size);
-    bool may_have_more() const { return file_ != nullptr && !is_at_end_; }
-    // How many bytes have been delivered since the start.
-    std::uint64_t consumed() const { return taken_from_file_ - static_cast<std::size_t>(run_.end - run_.cursor); }
+    static std::size_t supply(void* source, char* memory, std::size_t size, bool& is_last);
 
     std::string source_id_;
     FILE* file_ = nullptr;
     bool close_on_delete_ = true;
-    bool is_opened_here_ = false;
-    bool is_at_end_ = false;
-    hqf::byte_run run_;
-    const char* block_start_ = buffer_;
-    std::uint64_t taken_from_file_ = 0;
-    std::unique_ptr<char[]> large_block_;
-    std::size_t large_size_ = 0;
+    // Read ahead only if the file was opened here: a caller's handle is never read beyond the 512 bytes that `read`
+    // takes.
+    hqf::block_run blocks_{supply, this};
     char buffer_[512];
 };
 

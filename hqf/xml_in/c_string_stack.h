@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstddef>
+#include <cstring>
 #include <string>
 #include <string_view>
 
@@ -12,16 +13,34 @@ public:
     /// Size in bytes, NULs included; not the number of names.
     std::size_t get_stack_size() const { return size_; }
 
+    /// Marks a name that is readable up to the next multiple of 16 bytes.
+    static constexpr struct padding {
+    } padded{};
+
 private:
     friend class c_string_stack_node;
 
+    static constexpr std::size_t block = 16;
+
     void push(std::string_view name) {
-        const std::size_t size = size_ + name.size() + 1;
-        if (bytes_.size() < size) bytes_.resize(size < 256 ? 256 : 2 * size);
+        make_room(name.size());
         name.copy(&bytes_[size_], name.size());
-        bytes_[size - 1] = '\0';
-        size_ = size;
+        size_ += name.size() + 1;
+        bytes_[size_ - 1] = '\0';
     }
+    void push_padded(std::string_view name) {
+        make_room(name.size());
+        char* const to = &bytes_[size_];
+        for (std::size_t done = 0; done < name.size(); done += block)
+            std::memcpy(to + done, name.data() + done, block);
+        to[name.size()] = '\0';
+        size_ += name.size() + 1;
+    }
+    void make_room(std::size_t length) {
+        const std::size_t size = size_ + length + block;
+        if (bytes_.size() < size) grow(size);
+    }
+    [[gnu::noinline]] void grow(std::size_t size) { bytes_.resize(size < 256 ? 256 : 2 * size); }
 
     /// Room for names, used up to `size_`.
     std::string bytes_;
@@ -35,6 +54,11 @@ public:
         : stack_(stack)
         , offset_(stack.size_) {
         stack.push(name);
+    }
+    c_string_stack_node(c_string_stack& stack, std::string_view name, c_string_stack::padding)
+        : stack_(stack)
+        , offset_(stack.size_) {
+        stack.push_padded(name);
     }
     c_string_stack_node(const c_string_stack_node&) = delete;
     c_string_stack_node& operator=(const c_string_stack_node&) = delete;

@@ -15,15 +15,16 @@
 
 namespace hqf {
 
-/// What the general path would remember of the bytes that the fast path has read: the last name and the white-space
-/// mode of the last value. Written down when the general path goes on.
+/// What the fast path has read last, since the general path did: the engine writes it, and hands it over when the
+/// general path goes on. The pointers mean something to the engine alone.
 struct fast_trace {
-    enum class name_kind : unsigned char { none, element, attribute, xsi };
+    enum class name_kind : unsigned char { none, element, attribute, nil, type };
 
-    std::string_view name;
     name_kind kind = name_kind::none;
-    bool has_mode = false;
-    lmx::elmx_whitespace mode = lmx::preserve;
+    /// The name, for an element or an attribute.
+    const void* name = nullptr;
+    /// Where the last value went, null where none was read.
+    const void* value = nullptr;
 };
 
 // The reader's error object must exist before the tokeniser that reports to it, so it is a base in front of that one.

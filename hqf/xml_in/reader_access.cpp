@@ -8,18 +8,6 @@ void reader_access::look_prefixes_up(lmx::c_xml_reader& reader) {
     reader.are_prefixes_changed_ = false;
 }
 
-void reader_access::settle_trace(lmx::c_xml_reader& reader) {
-    fast_trace& trace = reader.trace_;
-    switch (trace.kind) {
-    case fast_trace::name_kind::element: set_name(reader, trace.name, 3, 1000); break;
-    case fast_trace::name_kind::xsi: set_name(reader, trace.name, 3, 5); break;
-    default: crack_name(reader, std::string(trace.name)); break;
-    }
-    if (trace.has_mode) set_ws_mode(reader, trace.mode);
-    forget_attributes(reader);
-    trace = {};
-}
-
 // An entity value that is being read must be read to its end by the general path.
 window* reader_access::open_window(lmx::c_get_with_entities& stream) {
     if (stream.get_entity_stack_depth() != 0) return nullptr;

@@ -31,13 +31,10 @@ struct reader_access {
 
     /// Elements of the model that are open in this reader; the engine counts them.
     static unsigned int& model_depth(lmx::c_xml_reader& reader) { return reader.model_depth_; }
-    /// What the fast path has read since the general path did; settle() hands it over.
     static fast_trace& trace(lmx::c_xml_reader& reader) { return reader.trace_; }
-    static void settle(lmx::c_xml_reader& reader) {
-        ++reader.general_steps_;
-        if (reader.trace_.kind != fast_trace::name_kind::none) settle_trace(reader);
-    }
-    /// How often settle() was called: each time before an event of the general path.
+    /// Before an event of the general path.
+    static void note_general_step(lmx::c_xml_reader& reader) { ++reader.general_steps_; }
+    /// How many events of the general path the engine has asked for.
     static unsigned int general_steps(const lmx::c_xml_reader& reader) { return reader.general_steps_; }
     /// Whether the input is used up, be it by a fatal report.
     static bool is_at_end(lmx::c_xml_reader& reader) {
@@ -45,6 +42,10 @@ struct reader_access {
         if (c != -1) reader.getter_.unget(c);
         return c == -1;
     }
+    /// Promises that the bytes lie in memory that outlives the stream: lines are not counted before someone asks.
+    static void note_lasting_source(lmx::c_get_as_utf8& stream) { stream.is_source_lasting_ = true; }
+    static void note_lasting_source(lmx::c_xml_reader& reader) { note_lasting_source(reader.getter_); }
+    static std::uint64_t bytes_read(const lmx::c_xml_reader& reader) { return reader.getter_.bytes_read(); }
     /// Sets the name read last, known to have this namespace number.
     ///
     /// \param prefix_length bytes in front of the colon; 0 for a name without one
@@ -69,7 +70,6 @@ struct reader_access {
     }
 
 private:
-    static void settle_trace(lmx::c_xml_reader& reader);
     static void look_prefixes_up(lmx::c_xml_reader& reader);
     static window* open_window(lmx::c_get_with_entities& stream);
 };

@@ -8,10 +8,11 @@
 
 namespace lmx {
 class c_get_as_utf8;
-class c_read_file;
-} // namespace lmx
+}
 
 namespace hqf {
+
+struct block_run;
 
 /// A look at the bytes ahead that need nothing special, so that names and values can be found in them with wide steps.
 ///
@@ -34,14 +35,10 @@ public:
     /// up to there can be loaded.
     const char* p = nullptr;
 
-    /// Opens the window if need be and sees to it that a fair run of bytes lies ahead. False: take a general step.
-    bool begin_step() {
-        if (p < last_start_) {
-            step_start_ = p;
-            return true;
-        }
-        return open();
-    }
+    /// The window is open, and a fair run of bytes lies ahead.
+    bool is_ready() const { return p < last_start_; }
+    /// Sees to that if need be. False: take a general step.
+    bool begin_step() { return is_ready() || open(); }
     bool is_open() const { return last_start_ != nullptr; }
     /// Hands position, line and last character back to the general path.
     void close();
@@ -67,7 +64,8 @@ public:
         return at != edge_ && *at == stop ? at : nullptr;
     }
 
-    /// The line at `p`. Lines are counted when someone asks, each byte once but for those of the current step.
+    /// The line at `p`, or where the general path stands behind a closed window. Each byte is looked at once for that:
+    /// while it is in the cache, or not before someone asks if the source outlives the reader.
     int line();
 
 private:
@@ -82,16 +80,16 @@ private:
     lmx::c_get_as_utf8& owner_;
     const char* end_ = nullptr;
     const char* edge_ = nullptr;
-    const char* step_start_ = nullptr;
     const char* opened_at_ = nullptr;
+    unsigned char before_opened_ = 0;
     const char* counted_ = nullptr;
     // Before this place a fair run lies ahead; null while the window is closed.
     const char* last_start_ = nullptr;
     // Where the source keeps its position, and where its block in memory starts.
     byte_run* run_ = nullptr;
     const char* block_start_ = nullptr;
-    lmx::c_read_file* file_ = nullptr;
-    // What the file had delivered when `edge_` was found: another figure means other bytes in the same memory.
+    block_run* blocks_ = nullptr;
+    // What the source had delivered when `edge_` was found: another figure means other bytes in the same memory.
     std::uint64_t edge_generation_ = 0;
 };
 

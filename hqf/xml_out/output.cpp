@@ -4,10 +4,24 @@
 
 #include "hqf/values/c_as_xml.h"
 #include "hqf/values/datetime_text.h"
-#include "hqf/values/number_text.h"
 #include "hqf/values/xml_escape.h"
 
 namespace hqf {
+
+namespace {
+
+/// A longer text goes straight to the stream.
+constexpr std::size_t most_at_once = 8 * 1024;
+
+lmx::c_as_xml<double> in_stream_form(const double& value) {
+    return lmx::c_as_xml(value);
+}
+template<class integer>
+integer in_stream_form(integer value) {
+    return value;
+}
+
+} // namespace
 
 output::output(lmx::c_xml_writer& writer)
     : writer_(writer)
@@ -17,107 +31,97 @@ output::output(lmx::c_xml_writer& writer)
     , tab_length_(std::strlen(tab_))
     , newline_length_(std::strlen(newline_))
     , plain_(typeid(writer) == typeid(lmx::c_xml_writer))
+    , has_short_newline_(plain_ && newline_length_ == 1)
     , standard_numbers_(has_default_format(stream_))
+    , most_levels_(plain_ && tab_length_ == 1 ? longest_tag : 0)
     , memory_(stream_.good() ? dynamic_cast<text_buffer*>(stream_.rdbuf()) : nullptr) {
-    take_room();
+    std::memset(tabs_, *tab_, longest_tag);
 }
 
-/// Starts to gather behind what the stream holds.
-void output::take_room() {
+char* output::begin() {
     begin_ = memory_ == nullptr ? block_ : memory_->room(most_at_once);
     end_ = memory_ == nullptr ? block_ + sizeof(block_) : memory_->room_end();
-    at_ = begin_;
+    return begin_;
 }
 
-void output::flush() {
-    if (at_ == begin_) return;
-    const char* const end = at_;
-    at_ = begin_;
+void output::flush(const char* at) {
+    if (at == begin_) return;
     if (memory_ != nullptr)
-        memory_->advance(end);
+        memory_->advance(at);
     else
-        stream_.write(begin_, end - begin_);
-    // Others may write before we do again, so room that is theirs as well is asked for anew.
-    if (memory_ != nullptr) begin_ = at_ = end_ = nullptr;
+        stream_.write(begin_, at - begin_);
 }
 
-void output::make_room() {
-    flush();
-    take_room();
+char* output::emptied(char* at) {
+    flush(at);
+    return begin();
 }
 
-void output::text(const char* data, std::size_t size) {
+char* output::text(char* at, const char* data, std::size_t size) {
     if (size > most_at_once) {
-        flush();
+        flush(at);
         stream_.write(data, static_cast<std::streamsize>(size));
-        return;
+        return begin();
     }
-    reserve(size);
-    std::memcpy(at_, data, size);
-    at_ += size;
+    if (!has_room(at, size)) at = emptied(at);
+    std::memcpy(at, data, size);
+    return at + size;
 }
 
-void output::indent_slowly() {
+char* output::indent_slowly(char* at) {
+    if (!plain_) {
+        flush(at);
+        writer_(true);
+        return begin();
+    }
     for (int level = 0; level < writer_access::nest_level(writer_); ++level)
-        text(tab_, tab_length_);
+        at = text(at, tab_, tab_length_);
+    return room(at);
 }
 
-void output::indent_through_writer() {
-    flush();
-    writer_(true);
-}
-
-void output::line_end_through_writer() {
-    flush();
+char* output::line_end_slowly(char* at) {
+    if (plain_) return room(text(at, newline_, newline_length_));
+    flush(at);
     const char* newline = writer_.endl();
-    text(newline, std::strlen(newline));
+    return room(text(begin(), newline, std::strlen(newline)));
 }
 
-void output::value(const std::wstring& text) {
+char* output::value(char* at, const std::wstring& text) {
     const wchar_t* next = text.data();
     const wchar_t* const end = next + text.size();
     while (next != end) {
-        reserve(escaped_size);
-        at_ = write_xml_escaped(at_, end_, next, end);
+        if (!has_room(at, escaped_size)) at = emptied(at);
+        at = write_xml_escaped(at, end_, next, end);
     }
+    return room(at);
 }
 
-/// A number through the stream where a caller has changed how it writes numbers, else straight into the block.
-template<class number, class stream_form>
-void output::put_number(number value, const stream_form& in_stream) {
-    if (!standard_numbers_) {
-        flush();
-        stream_ << in_stream;
-        return;
+/// For a stream that a caller has told to write numbers in another way.
+template<class number>
+char* output::number_through_stream(char* at, number value) {
+    flush(at);
+    stream_ << in_stream_form(value);
+    return begin();
+}
+template char* output::number_through_stream(char* at, double value);
+template char* output::number_through_stream(char* at, int value);
+template char* output::number_through_stream(char* at, unsigned int value);
+
+char* output::value(char* at, const lmx::c_datetime& moment) {
+    if (standard_numbers_) {
+        at = write_datetime(at, moment);
+        stream_.fill('0'); // as the insertion would leave it
+        return at;
     }
-    reserve(number_text_size);
-    at_ = write_number(at_, value);
+    flush(at);
+    stream_ << moment;
+    return begin();
 }
 
-void output::value(double number) {
-    put_number(number, lmx::c_as_xml(number));
-}
-void output::value(int number) {
-    put_number(number, number);
-}
-void output::value(unsigned int number) {
-    put_number(number, number);
-}
-
-void output::value(const lmx::c_datetime& moment) {
-    if (!standard_numbers_) {
-        flush();
-        stream_ << moment;
-        return;
-    }
-    reserve(datetime_text_size);
-    at_ = write_datetime(at_, moment);
-    stream_.fill('0'); // as the insertion would leave it
-}
-
-void output::value(const lmx::c_binary& bytes) {
-    flush();
+char* output::value(char* at, const lmx::c_binary& bytes) {
+    flush(at);
     bytes.out_base64(stream_);
+    return begin();
 }
 
 } // namespace hqf

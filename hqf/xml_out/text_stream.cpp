@@ -3,10 +3,14 @@
 #include <algorithm>
 #include <cstdlib>
 #include <cstring>
+#include <exception>
+#include <limits>
 #include <new>
+#include <optional>
 #include <utility>
 
 #include "hqf/platform/pages.h"
+#include "hqf/values/transcode.h"
 
 namespace hqf {
 
@@ -14,8 +18,57 @@ namespace {
 
 /// Blocks grow from one that a small document fills to one that a large document notes no more.
 constexpr std::size_t first_block = 64 * 1024, largest_block = 4 * 1024 * 1024;
-/// What the put position of a stream buffer can be moved by in one step.
-constexpr std::size_t most_at_once = 1024 * 1024 * 1024;
+
+/// Documents change between a load and a write, and between two writes: a little more is needed, at times.
+constexpr std::size_t with_reserve(std::size_t expected) {
+    return expected + expected / 64 + 4096;
+}
+
+/// A text that was expected to be much longer doesn't hold on to the memory.
+template<class text_type>
+void give_up_excess(text_type& text) {
+    if (text.size() < text.capacity() / 2) text.shrink_to_fit();
+}
+
+/// Makes `text` a new string of up to `size` bytes that `fill` writes; it gets the memory and gives how many it wrote.
+template<class filler>
+void fill_new(std::string& text, std::size_t size, const filler& fill) {
+#if defined(__cpp_lib_string_resize_and_overwrite)
+    text.reserve(size);
+    expect_filling(text.data(), size);
+    // Nothing may be thrown through the string.
+    std::exception_ptr thrown;
+    text.resize_and_overwrite(size, [&](char* memory, std::size_t) noexcept -> std::size_t {
+        try {
+            return fill(memory, size);
+        } catch (...) {
+            thrown = std::current_exception();
+            return 0;
+        }
+    });
+    if (thrown != nullptr) std::rethrow_exception(thrown);
+#else
+    // This library can't leave the bytes of a string to be written later, so all go to blocks.
+    static_cast<void>(size);
+    text.resize(fill(nullptr, 0));
+#endif
+}
+
+/// The bytes of UTF-8 that come block by block, as wide text.
+struct wide_target {
+    std::wstring text;
+    bool has_ended = false;
+
+    /// A character that the block's end cuts in two is left for the next time.
+    static std::size_t take(void* target, const char* bytes, std::size_t size) {
+        auto& own = *static_cast<wide_target*>(target);
+        if (own.has_ended) return 0;
+        const char* const end = bytes + size;
+        const auto left = static_cast<std::size_t>(end - append_wide(own.text, bytes, size));
+        own.has_ended = left >= longest_character;
+        return own.has_ended ? 0 : left;
+    }
+};
 
 } // namespace
 
@@ -24,10 +77,10 @@ text_buffer::~text_buffer() {
         std::free(each.begin);
 }
 
-void text_buffer::begin_block(std::size_t size) {
+void text_buffer::begin_block() {
+    if (take_ != nullptr && !blocks_.empty()) return empty_block();
     note_use();
-    const std::size_t usual = std::min(first_block << std::min<std::size_t>(blocks_.size(), 8), largest_block);
-    const std::size_t capacity = std::max(usual, size);
+    const std::size_t capacity = std::min(first_block << std::min<std::size_t>(blocks_.size(), 8), largest_block);
     blocks_.reserve(blocks_.size() + 1);
     void* const place = allocate_for_filling(capacity);
     if (place == nullptr) throw std::bad_alloc();
@@ -36,18 +89,33 @@ void text_buffer::begin_block(std::size_t size) {
     setp(begin, begin + capacity);
 }
 
-void text_buffer::move_to(std::string& text) {
+void text_buffer::empty_block() {
+    const std::size_t left = take_(target_, pbase(), gathered());
+    std::memmove(pbase(), pptr() - left, left);
+    setp(pbase(), epptr());
+    advance_by(static_cast<std::ptrdiff_t>(left));
+}
+
+void text_buffer::advance_by(std::ptrdiff_t size) {
+    // The put position of a stream buffer can't be moved by more in one step.
+    constexpr int most = std::numeric_limits<int>::max();
+    for (; size > most; size -= most)
+        pbump(most);
+    pbump(static_cast<int>(size));
+}
+
+void text_buffer::move_blocks_to(std::string& text) {
     note_use();
-    std::size_t size = 0;
+    std::size_t size = text.size();
     for (const block& each : blocks_)
         size += each.used;
-    std::string roomy;
     if (text.capacity() < size) {
+        std::string roomy;
         roomy.reserve(size);
         expect_filling(roomy.data(), size);
+        roomy.append(text);
         text.swap(roomy);
     }
-    text.clear();
     for (const block& each : std::exchange(blocks_, {})) {
         text.append(each.begin, each.used);
         std::free(each.begin);
@@ -58,20 +126,57 @@ void text_buffer::move_to(std::string& text) {
 text_buffer::int_type text_buffer::overflow(int_type c) {
     if (traits_type::eq_int_type(c, traits_type::eof())) return traits_type::not_eof(c);
     *room(1) = traits_type::to_char_type(c);
-    pbump(1);
+    advance_by(1);
     return c;
 }
 
 std::streamsize text_buffer::xsputn(const char* data, std::streamsize size) {
-    for (std::size_t left = static_cast<std::size_t>(size); left != 0;) {
-        const std::size_t step = std::min(left, most_at_once);
-        char* const at = room(step);
-        std::memcpy(at, data, step);
-        advance(at + step);
+    for (std::streamsize left = size; left != 0;) {
+        char* const at = room(1);
+        const std::streamsize step = std::min<std::streamsize>(left, epptr() - at);
+        std::memcpy(at, data, static_cast<std::size_t>(step));
+        advance_by(step);
         data += step;
         left -= step;
     }
     return size;
+}
+
+void gather(std::string& out, std::size_t expected, const stream_call& write) {
+    std::string text;
+    std::optional<text_stream> stream;
+    bool is_wanted = false;
+    const auto fill = [&](char* memory, std::size_t size) {
+        stream.emplace(memory, size);
+        is_wanted = write(*stream);
+        return stream->buffer().size_in_memory();
+    };
+    if (expected == 0)
+        fill(nullptr, 0);
+    else
+        fill_new(text, with_reserve(expected), fill);
+    if (!is_wanted) return;
+    stream->buffer().move_blocks_to(text);
+    give_up_excess(text);
+    out.swap(text);
+}
+
+void gather(std::wstring& out, std::size_t expected, const stream_call& write) {
+    if (expected == 0) {
+        std::string utf8;
+        bool is_wanted = false;
+        gather(utf8, 0, [&](std::ostream& stream) { return is_wanted = write(stream); });
+        if (is_wanted) assign_wide(out, utf8.data(), utf8.size());
+        return;
+    }
+    wide_target wide;
+    wide.text.reserve(with_reserve(expected));
+    expect_filling(wide.text.data(), with_reserve(expected) * sizeof(wchar_t));
+    text_stream stream(wide_target::take, static_cast<void*>(&wide));
+    if (!write(stream)) return;
+    stream.buffer().finish();
+    give_up_excess(wide.text);
+    out.swap(wide.text);
 }
 
 } // namespace hqf

@@ -3,6 +3,7 @@
 #pragma once
 
 #include <cstddef>
+#include <functional>
 #include <ostream>
 #include <streambuf>
 #include <string>
@@ -12,26 +13,40 @@ namespace hqf {
 
 class text_buffer final : public std::streambuf {
 public:
+    /// Takes over what a full block holds, and gives how many bytes at its end it leaves for the next time.
+    using block_taker = std::size_t (*)(void* target, const char* text, std::size_t size);
+
     text_buffer() = default;
+    /// Gathers in one block, which `take` empties whenever it is full.
+    text_buffer(block_taker take, void* target)
+        : take_(take)
+        , target_(target) {}
+    /// Gathers in memory of the caller's first, and in blocks what doesn't fit there.
+    text_buffer(char* memory, std::size_t size) { setp(memory, memory + size); }
     text_buffer(const text_buffer&) = delete;
     text_buffer& operator=(const text_buffer&) = delete;
     ~text_buffer() override;
 
-    /// Replaces `text` by what was written, and empties the buffer, each block as soon as it is copied.
+    /// How many bytes lie in the caller's memory.
+    std::size_t size_in_memory() const { return blocks_.empty() ? gathered() : used_in_memory_; }
+    /// Appends what the blocks hold, and empties them, each as soon as it is copied.
     ///
     /// \throws std::bad_alloc; `text` is as it was.
-    void move_to(std::string& text);
+    void move_blocks_to(std::string& text);
+    /// Hands the last text over to the taker.
+    void finish() { take_(target_, pbase(), gathered()); }
 
-    /// Where the next text may be written, with room for `size` bytes at least up to room_end().
+    /// Where the next text may be written, with room for `size` bytes at least up to room_end(); at most 64 KB can be
+    /// asked for.
     ///
     /// \throws std::bad_alloc
     char* room(std::size_t size) {
-        if (static_cast<std::size_t>(epptr() - pptr()) < size) begin_block(size);
+        if (static_cast<std::size_t>(epptr() - pptr()) < size) begin_block();
         return pptr();
     }
     char* room_end() const { return epptr(); }
     /// Takes over what was written there, up to `end`.
-    void advance(const char* end) { pbump(static_cast<int>(end - pptr())); }
+    void advance(const char* end) { advance_by(end - pptr()); }
 
 protected:
     int_type overflow(int_type c) override;
@@ -43,25 +58,43 @@ private:
         std::size_t used;
     };
 
-    void begin_block(std::size_t size);
-    void note_use() {
-        if (!blocks_.empty()) blocks_.back().used = static_cast<std::size_t>(pptr() - pbase());
-    }
+    std::size_t gathered() const { return static_cast<std::size_t>(pptr() - pbase()); }
+    void advance_by(std::ptrdiff_t size);
+    void begin_block();
+    void empty_block();
+    void note_use() { (blocks_.empty() ? used_in_memory_ : blocks_.back().used) = gathered(); }
 
+    const block_taker take_ = nullptr;
+    void* const target_ = nullptr;
+    std::size_t used_in_memory_ = 0;
     /// The last is the one that the put area lies in; its use is noted when someone asks.
     std::vector<block> blocks_;
 };
 
+/// \param arguments those of the buffer's constructor
 class text_stream final : public std::ostream {
 public:
-    text_stream()
-        : std::ostream(nullptr) {
+    template<class... arguments>
+    explicit text_stream(arguments... values)
+        : std::ostream(nullptr)
+        , buffer_(values...) {
         rdbuf(&buffer_);
     }
-    void move_to(std::string& text) { buffer_.move_to(text); }
+    text_buffer& buffer() { return buffer_; }
 
 private:
     text_buffer buffer_;
 };
+
+using stream_call = std::function<bool(std::ostream& stream)>;
+
+/// Gives `out` what `write` puts on a stream, if that returns true; otherwise `out` stays as it was.
+///
+/// \param expected about how many bytes that will be, 0 if nobody knows. Up to there the text is gathered in the new
+/// string itself; only what goes beyond is copied once.
+/// \throws std::bad_alloc, and what `write` throws
+void gather(std::string& out, std::size_t expected, const stream_call& write);
+/// The same as wide text. It ends where the bytes are no UTF-8.
+void gather(std::wstring& out, std::size_t expected, const stream_call& write);
 
 } // namespace hqf

@@ -161,14 +161,15 @@ TEST(datetime_text, short_roads_agree_with_the_long_ones) {
         ASSERT_EQ(hqf::is_datetime(text.data(), end), c_datetime::is_valid(text)) << text;
         c_datetime value("-0007-07-07T07:07:07+07:07");
         const std::string before = fields(value);
-        if (hqf::read_zoned_datetime(text.data(), end, value)) {
+        const char* const stop = hqf::scan_zoned_datetime(text.data(), end, value);
+        if (stop == end) {
             ++short_roads;
             ASSERT_TRUE(c_datetime::is_valid(text)) << text;
             ASSERT_EQ(hqf::match_zone_pattern(text.data(), end), hqf::zone_pattern::matched) << text;
             ASSERT_EQ(fields(value), fields(c_datetime(text))) << text;
             char out[hqf::datetime_text_size];
             ASSERT_EQ(std::string(out, hqf::write_datetime(out, value)), value.get_as_string()) << text;
-        } else {
+        } else if (stop == nullptr) {
             ASSERT_EQ(fields(value), before) << text;
         }
     }

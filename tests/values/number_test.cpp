@@ -11,6 +11,7 @@
 #include "hqf/values/c_as_xml.h"
 #include "hqf/values/lexical.h"
 #include "hqf/values/number_text.h"
+#include "hqf/values/short_decimal.h"
 #include "hqf/values/to_number.h"
 #include "tests/values/table.h"
 
@@ -34,6 +35,13 @@ void expect_as_strtod(const std::string& text) {
     EXPECT_EQ(read, lmx::is_valid_float(text)) << text;
     EXPECT_TRUE(!read || same(value, expected)) << text << " gave " << value;
     EXPECT_TRUE(same(hqf::to_double(text), expected)) << text << " gave " << hqf::to_double(text);
+    // The short roads read on to what ends the value, with bytes of anything behind it.
+    const std::string padded = text + '<' + std::string(32, '7');
+    for (const auto scan : {hqf::scan_few_digits, hqf::scan_short_decimal}) {
+        const char* const stop = scan(padded.data(), value);
+        const bool is_all = stop == padded.data() + text.size();
+        EXPECT_TRUE(!is_all || (read && same(value, expected))) << text << " gave " << value;
+    }
 }
 
 TEST(scan_double, hard_cases_as_strtod) {
@@ -80,6 +88,16 @@ TEST(scan_double, random_texts_as_strtod) {
             noise += alphabet[below(sizeof alphabet - 1)];
         expect_as_strtod(noise);
         if (HasFailure()) FAIL() << "first failure is enough";
+    }
+}
+
+TEST(scan_few_digits, takes_the_usual_measured_values) {
+    for (const std::string text :
+         {"0", "-0", "7", "100", "50.25", "-61.55", "46.8578", "0.6932", "1234567", "-0.00001"}) {
+        double value = 42;
+        const std::string padded = text + "<7777777";
+        EXPECT_EQ(hqf::scan_few_digits(padded.data(), value), padded.data() + text.size()) << text;
+        EXPECT_TRUE(same(value, std::atof(text.c_str()))) << text << " gave " << value;
     }
 }
 

@@ -3,8 +3,11 @@
 #include "support.h"
 
 #include "hqf/values/text.h"
+#include "hqf/xml_in/reader_access.h"
+#include "hqf/xml_in/wide_source.h"
 
 #include <algorithm>
+#include <random>
 
 namespace {
 
@@ -49,6 +52,43 @@ TEST(byte_source, gives_every_byte_and_the_same_again_after_rewind) {
             return bytes;
         };
         given{read_thrice}.from_every_source({{bytes, bytes, std::to_string(size) + " bytes"}});
+    }
+}
+
+TEST(byte_source, wide_text_as_its_conversion_block_by_block) {
+    std::minstd_rand random(5);
+    const std::wstring parts[] = {L"a",
+                                  L"<Lab>50.25</Lab>\n",
+                                  L"\xE9",
+                                  L"\x20AC",
+                                  L"\xD83C\xDFA8",
+                                  L"\xD83C",
+                                  L"\xDFA8",
+                                  L"\xD83Cx",
+                                  std::wstring(1, L'\0'),
+                                  std::wstring(200, L'.')};
+    for (int round = 0; round < 40; ++round) {
+        std::wstring text = L"<Hqf";
+        while (text.size() < 150000)
+            text += parts[random() % (round % 2 == 0 ? 2 : std::size(parts))];
+        if (round % 3 == 0) text.back() = 0xD83C;
+        std::string bytes;
+        lmx::convert(&bytes, text);
+        hqf::wide_source source(text);
+        ASSERT_TRUE(read_all(source) == bytes) << round;
+        source.rewind();
+        recorder errors;
+        lmx::c_get_with_entities through_window(source, errors);
+        std::string read = next(through_window, text.find(L'f') + 1);
+        while (hqf::window* const w = hqf::reader_access::begin_step(through_window)) {
+            const char* const from = w->p;
+            w->room(from, 1 + random() % 1000);
+            w->p = std::min(w->edge(), from + 1 + random() % 1000);
+            read.append(from, w->p);
+            if (w->p == from) break;
+        }
+        ASSERT_EQ(read, bytes.substr(0, read.size())) << round;
+        EXPECT_TRUE(round % 2 != 0 || read.size() + 300 > bytes.size()) << "ASCII is never left: " << read.size();
     }
 }
 

@@ -252,9 +252,11 @@ class _Bodies:
         cls, rows = self.cls, self.rows
         if cls.has_entry_points:
             name = f'"{cls.element}"'
+            text_size = ", &text_size_" if cls.document else ""
             self.define(ERROR, "marshal(const char* file_name)",
                         f"return frame::marshal_to_file(*this, {name}, file_name);")
-            self.define(ERROR, "marshal(std::string* out)", f"return frame::marshal_to_string(*this, {name}, out);")
+            self.define(ERROR, "marshal(std::string* out)",
+                        f"return frame::marshal_to_string(*this, {name}, out{text_size});")
             self.define(ERROR, "marshal(std::ostream& stream)",
                         f"return frame::marshal_to_stream(*this, {name}, stream);")
             self.define(ERROR, "unmarshal(const char* file_name)", "return frame::unmarshal_file(*this, file_name);")
@@ -263,7 +265,7 @@ class _Bodies:
             self.define(ERROR, "unmarshal(const std::string& text)",
                         "return frame::unmarshal_text(*this, text);")
             self.define(ERROR, f"unmarshal({READER})",
-                        f"return frame::unmarshal_document(*this, reader, \"{cls.name}\");")
+                        f"return frame::unmarshal_document(*this, reader, \"{cls.name}\"{text_size});")
         if cls.form == "group":
             self.define(ERROR, f"marshal({WRITER}, const char*)", f"return frame::write_group({rows}, this, writer);")
             self.define("bool", f"unmarshal({READER}, std::string* name, {ERROR}* error)",

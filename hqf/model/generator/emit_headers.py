@@ -422,6 +422,8 @@ class _Header:
 
     def document(self) -> None:
         self.forward.add("XMLDocumentResult")
+        self.storage.append("/// Bytes of the text last read or written: about what the next write will take.")
+        self.storage.append("std::size_t text_size_ = 0;")
         self.add()
         self.doc("Reads a document from a file: an archive if the name ends in \".hqfz\", else XML. As unmarshal().")
         self.add("lmx::elmx_error loadFile(const std::wstring& path);")

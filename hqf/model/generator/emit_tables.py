@@ -225,6 +225,8 @@ class _Tables:
         rows = self.child_rows(cls)
         facts += [f".needed_{what} = frame::needed(frame::rows_of<{name}>::{what})"
                   for what, some in (("attributes", attributes), ("rows", rows)) if some]
+        if rows:
+            facts.append(f".mandatory_rows = frame::mandatory_among(frame::rows_of<{name}>::rows)")
         if attributes:
             lines.append(f"static constexpr lmx::s_event_map {name}_attribute_events[] = "
                          f"{{{self.event_rows([a.name for a in attributes], '1')}}};")
