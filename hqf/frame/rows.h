@@ -37,7 +37,7 @@ extern const lmx::s_ns_map namespace_map[];
 /// An element name of the vocabulary as it stands in a document of our own, once for all the places that use it.
 struct alignas(16) element_name {
     /// "<Hqf:Name>", padded so that whole 16-byte blocks can be copied and compared from any place in the text.
-    char open[80];
+    char open[64];
     /// Length of `open`, both brackets included.
     std::uint8_t length;
     /// The number that event tables give the name.
