@@ -5,12 +5,12 @@
 
 #include "hqf/values/c_big_int.h"
 #include "hqf/values/c_decimal.h"
-#include "tests/values/table.h"
+#include "tests/support/table.h"
 
 namespace {
 
 using namespace lmx;
-using values_test::rows, values_test::words, values_test::stands, values_test::expect_order;
+using support::rows, support::words, support::stands, support::expect_order;
 
 TEST(c_big_int, canonical_text) {
     for (const auto& [text, canonical] : rows<2>(R"(

@@ -10,12 +10,12 @@
 #include "hqf/values/c_duration.h"
 #include "hqf/values/c_pattern.h"
 #include "hqf/values/datetime_text.h"
-#include "tests/values/table.h"
+#include "tests/support/table.h"
 
 namespace {
 
 using namespace lmx;
-using values_test::rows, values_test::words, values_test::stands, values_test::expect_order;
+using support::rows, support::words, support::stands, support::expect_order;
 
 std::string fields(const c_datetime_base& v) {
     std::ostringstream os;
@@ -214,11 +214,20 @@ TEST(c_duration, normalize_carries_up_to_days_and_years) {
 }
 
 TEST(c_duration, order_exists_only_where_months_leave_it_settled) {
+    const auto expect = [](const std::string& a, char relation, const std::string& b) {
+        EXPECT_TRUE(stands(c_duration(a.c_str()), relation, c_duration(b.c_str()))) << a << relation << b;
+    };
     for (const auto& [a, relation, b] : rows<3>(R"(
-        PT90S = PT1M30S   P12M = P1Y   P30D ? P1M   P1M > P32D   P32D < P1M   P1M ? P29D   P1M > P28D   P2M ? P60D
-        P2M > P59D   P2M > P62D   P2M ? P61D   P1Y > P365D   P1Y1M ? P1Y29D   P1Y1M < P2Y   PT1S < PT2S
-        P1D = PT24H   P1DT1H > PT24H   P5M < P12M1D)"))
-        EXPECT_TRUE(stands(c_duration(a.c_str()), relation[0], c_duration(b.c_str()))) << a << relation << b;
+        PT90S = PT1M30S   P12M = P1Y   P1M > P32D   P32D < P1M   P2D > P1D   P1Y > P365D   P1Y1M ? P1Y29D   P1Y1M < P2Y
+        PT1S < PT2S   P1D = PT24H   P1DT1H > PT24H   P5M < P12M1D)"))
+        expect(a, relation[0], b);
+    // The days of the shortest and of the longest run of 1, 2, ... months.
+    const int runs[][2] = {{28, 31},   {59, 62},   {89, 92},   {120, 123}, {150, 153}, {181, 184},
+                           {212, 215}, {242, 245}, {273, 276}, {303, 306}, {334, 337}};
+    for (const auto& run : runs)
+        for (const auto& [days, relation] :
+             {std::pair{run[0], '>'}, {run[0] + 1, '?'}, {run[1] - 1, '?'}, {run[1], '>'}})
+            expect("P" + std::to_string(&run - runs + 1) + "M", relation, "P" + std::to_string(days) + "D");
     EXPECT_TRUE(c_duration("P1Y") != c_duration("-P1Y") && !(c_duration("P1Y") == c_duration("-P1Y")));
 }
 

@@ -3,12 +3,12 @@
 #include "hqf/values/c_xml_list_tokeniser.h"
 #include "hqf/values/ct_qname.h"
 #include "hqf/values/lexical.h"
-#include "tests/values/table.h"
+#include "tests/support/table.h"
 
 namespace {
 
 using namespace lmx;
-using values_test::rows, values_test::words;
+using support::rows, support::words;
 
 const std::string clef = "\xF0\x9D\x84\x9E";               // U+1D11E
 const std::string split_clef = "\xED\xA0\xB4\xED\xB4\x9E"; // the same as two surrogates of three bytes
@@ -17,9 +17,9 @@ TEST(length, counts_characters) {
     // A split pair is one character, and a step of six bytes. A byte that starts nothing is counted and ends the count;
     // continuation bytes aren't checked.
     using row = std::pair<std::string, unsigned int>;
-    const auto rows = values_test::list(row{"", 0}, row{"abc", 3}, row{"\xC3\xA4\xE2\x82\xAC" + clef, 3},
-                                        row{split_clef + split_clef + "x", 3}, row{"\xED\x9F\xBFx", 2}, row{"\xED", 1},
-                                        row{"ab\x80zz", 3}, row{"\xF8xxxx", 1}, row{"a\xE2", 2}, row{"\xC3zz", 2});
+    const auto rows = support::list(row{"", 0}, row{"abc", 3}, row{"\xC3\xA4\xE2\x82\xAC" + clef, 3},
+                                    row{split_clef + split_clef + "x", 3}, row{"\xED\x9F\xBFx", 2}, row{"\xED", 1},
+                                    row{"ab\x80zz", 3}, row{"\xF8xxxx", 1}, row{"a\xE2", 2}, row{"\xC3zz", 2});
     for (const auto& [text, expected] : rows)
         EXPECT_EQ(length(text), expected) << text;
 }
@@ -28,12 +28,12 @@ TEST(is_length_ok, byte_size_decides_outside_the_band) {
     // Six bytes exceed four times one, though they are one character; twelve reach four times three. Four times a large
     // bound mustn't wrap.
     using row = std::tuple<std::string, unsigned int, bool, bool>;
-    const auto rows = values_test::list(row{"", 0, true, true}, row{"", 1, false, true}, row{"abc", 3, true, true},
-                                        row{"abc", 4, false, true}, row{"abc", 2, true, false},
-                                        row{"\xC3\xA4\xC3\xA4", 2, true, true}, row{"\xC3\xA4\xC3\xA4", 3, false, true},
-                                        row{"\xC3\xA4\xC3\xA4", 1, true, false}, row{split_clef, 1, true, false},
-                                        row{split_clef + split_clef, 3, true, true},
-                                        row{"abcd", 0x40000000, false, true}, row{"abcd", 0xC0000000, false, true});
+    const auto rows = support::list(
+        row{"", 0, true, true}, row{"", 1, false, true}, row{"abc", 3, true, true}, row{"abc", 4, false, true},
+        row{"abc", 2, true, false}, row{"\xC3\xA4\xC3\xA4", 2, true, true}, row{"\xC3\xA4\xC3\xA4", 3, false, true},
+        row{"\xC3\xA4\xC3\xA4", 1, true, false}, row{split_clef, 1, true, false},
+        row{split_clef + split_clef, 3, true, true}, row{clef + clef + clef, 4, false, true},
+        row{"abcd", 0x40000000, false, true}, row{"abcd", 0xC0000000, false, true});
     for (const auto& [text, bound, min, max] : rows) {
         EXPECT_EQ(is_min_length_ok(text, bound), min) << text << " " << bound;
         EXPECT_EQ(is_max_length_ok(text, bound), max) << text << " " << bound;

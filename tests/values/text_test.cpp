@@ -3,12 +3,11 @@
 #include <algorithm>
 #include <iomanip>
 
-#include "hqf/platform/paths.h"
 #include "hqf/values/c_as_xml.h"
 #include "hqf/values/text.h"
 #include "hqf/values/transcode.h"
 #include "hqf/values/xml_escape.h"
-#include "tests/values/table.h"
+#include "tests/support/table.h"
 
 namespace {
 
@@ -25,7 +24,7 @@ TEST(convert, utf8_to_wide) {
     // A split pair is a pair, a lone low surrogate is kept, overlong forms pass. A high surrogate without its low one
     // ends the text, as does whatever is no character.
     using row = std::pair<std::string, std::wstring>;
-    const auto rows = values_test::list(
+    const auto rows = support::list(
         row{"", L""}, row{"a\x7F", L"a\x7F"}, row{std::string("a\0b", 3), std::wstring(L"a\0b", 3)},
         row{"\xC2\x80\xDF\xBF", L"\x80\x7FF"}, row{"\xE0\xA0\x80\xEF\xBF\xBF", L"\x800\xFFFF"},
         row{clef8 + "x", clef16 + L"x"}, row{split_clef8 + "x", clef16 + L"x"}, row{"\xED\xB4\x9Ex", low + L"x"},
@@ -53,7 +52,7 @@ TEST(convert, wide_to_utf8_and_escaped) {
     // An unpaired high surrogate loses the next element, and ends the escaping. What is no character is replaced, even
     // if its low byte is a less-than sign.
     using row = std::tuple<std::wstring, std::string, std::string>;
-    const auto rows = values_test::list(
+    const auto rows = support::list(
         row{L"a>b&c<'\"", "a>b&c<'\"", "a>b&amp;c&lt;&apos;&quot;"},
         row{L"\x7F\x80\x7FF", "\x7F\xC2\x80\xDF\xBF", "\x7F\xC2\x80\xDF\xBF"},
         row{L"\x800\xFFFF", "\xE0\xA0\x80\xEF\xBF\xBF", "\xE0\xA0\x80\xEF\xBF\xBF"},
@@ -100,12 +99,12 @@ TEST(c_as_ascii, everything_above_ascii_is_a_point) {
 TEST(utf8_to_unicode_char, and_back) {
     // What was built before the fault is given, too.
     using row = std::tuple<const char*, bool, int>;
-    const auto rows = values_test::list(row{"\x7F", true, 0x7F}, row{"\xC2\x80", true, 0x80},
-                                        row{"\xDF\xBF", true, 0x7FF}, row{"\xE0\xA0\x80", true, 0x800},
-                                        row{"\xED\xA0\xB4", true, 0xD834}, row{"\xEF\xBF\xBF", true, 0xFFFF},
-                                        row{"\xF0\x90\x80\x80", true, 0x10000}, row{"\xF4\x8F\xBF\xBF", true, 0x10FFFF},
-                                        row{"\xC3(", false, 3}, row{"\xE2\x82(", false, 0x82}, row{"\xF0", false, 0},
-                                        row{"\x80", false, -1}, row{"\xF8\x88\x80\x80\x80", false, -1});
+    const auto rows =
+        support::list(row{"\x7F", true, 0x7F}, row{"\xC2\x80", true, 0x80}, row{"\xDF\xBF", true, 0x7FF},
+                      row{"\xE0\xA0\x80", true, 0x800}, row{"\xED\xA0\xB4", true, 0xD834},
+                      row{"\xEF\xBF\xBF", true, 0xFFFF}, row{"\xF0\x90\x80\x80", true, 0x10000},
+                      row{"\xF4\x8F\xBF\xBF", true, 0x10FFFF}, row{"\xC3(", false, 3}, row{"\xE2\x82(", false, 0x82},
+                      row{"\xF0", false, 0}, row{"\x80", false, -1}, row{"\xF8\x88\x80\x80\x80", false, -1});
     char out[5];
     for (const auto& [utf8, ok, expected] : rows) {
         int value = 99;
@@ -130,15 +129,6 @@ TEST(is_valid_utf8_char_sequence, first_two_bytes_decide) {
             const char in[] = {static_cast<char>(first), static_cast<char>(second), '\0'};
             ASSERT_EQ(is_valid_utf8_char_sequence(in), expected) << first << " " << second;
         }
-}
-
-TEST(path_to_utf8, joins_pairs_and_keeps_half_ones) {
-    EXPECT_EQ(hqf::path_to_utf8(L"/t\x00E4\x20AC" + clef16 + std::wstring{wchar_t(0x1D11E)} + high + L"A"),
-              "/t\xC3\xA4\xE2\x82\xAC" + clef8 + clef8 + "\xED\xA0\xB4" + "A");
-    const std::string path = testing::TempDir() + "hqf_values_remove";
-    std::fclose(hqf::open_file(std::wstring(path.begin(), path.end()), "wb"));
-    EXPECT_TRUE(hqf::remove_file(std::wstring(path.begin(), path.end())));
-    EXPECT_EQ(hqf::open_file(std::wstring(path.begin(), path.end()), "rb"), nullptr);
 }
 
 } // namespace

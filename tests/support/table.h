@@ -8,7 +8,7 @@
 
 #include <gtest/gtest.h>
 
-namespace values_test {
+namespace support {
 
 /// The words of a text. "''" stands for the empty one, "_" for a blank within one.
 inline std::vector<std::string> words(const std::string& text) {
@@ -59,4 +59,4 @@ void expect_order(const std::vector<std::string>& ascending, const std::vector<s
                 << ascending[i] << " " << respelled[j];
 }
 
-} // namespace values_test
+} // namespace support
