@@ -4,7 +4,7 @@
 #include <algorithm>
 #include <string>
 
-namespace growth {
+namespace support {
 
 /// Makes a text of a pattern: what stands in braces is repeated n times with the number of its turn, from 0, for '@'
 /// and the next number for '^'; '$' is n.
@@ -62,7 +62,13 @@ struct parts {
     std::string palette = {};   ///< colours in a set
 };
 
-inline std::string document(const parts& p, unsigned int n) {
+/// With so much text, or what else there is, in the owner's first company.
+inline parts company(const std::string& content) {
+    return {.owner = element("Company", content)};
+}
+
+/// A document that has its parts n times.
+inline std::string patterned_document(const parts& p, unsigned int n) {
     const std::string pattern =
         "<!DOCTYPE Hqf:Hqf [" + p.subset + "]><Hqf:Hqf xmlns:Hqf=\"http://hqf.example/v2\"" +
         " xmlns:xsi=\"http://www.w3.org/2001/XMLSchema-instance\"" + p.root + ">" +
@@ -78,4 +84,4 @@ inline std::string document(const parts& p, unsigned int n) {
     return expanded(pattern, n);
 }
 
-} // namespace growth
+} // namespace support
