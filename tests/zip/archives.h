@@ -4,41 +4,23 @@
 
 #include "hqf/zip/CZipArchive.h"
 #include "hqf/zip/little_endian.h"
+#include "tests/support/files.h"
 
 #include <bzlib.h>
 #include <zlib.h>
 
 #include <algorithm>
-#include <filesystem>
-#include <fstream>
-#include <iterator>
 #include <string>
-#include <unistd.h>
 #include <vector>
 
 namespace zip_test {
 
-/// A folder of its own for each test program, gone at its end.
-inline const std::filesystem::path& folder() {
-    const auto path = std::filesystem::temp_directory_path() / ("hqf-zip-" + std::to_string(::getpid()));
-    struct temporary : std::filesystem::path {
-        ~temporary() { remove_all(*this); }
-    };
-    static const temporary made{path};
-    return std::filesystem::create_directories(made), made;
-}
+using support::bytes_of, support::make_file, support::wide;
 
-inline std::wstring wide(const std::filesystem::path& path) {
-    return path.wstring();
-}
-
-inline void put(const std::filesystem::path& path, const std::string& bytes) {
-    std::ofstream(path, std::ios::binary).write(bytes.data(), static_cast<std::streamsize>(bytes.size()));
-}
-
-inline std::string get(const std::filesystem::path& path) {
-    std::ifstream in(path, std::ios::binary);
-    return {std::istreambuf_iterator<char>(in), {}};
+/// A folder of its own for each test program.
+inline const support::folder& folder() {
+    static const support::folder made;
+    return made;
 }
 
 inline std::uint32_t crc_of(const std::string& bytes) {
@@ -153,7 +135,7 @@ inline outcome load(const std::filesystem::path& path, unsigned int piece = 0xFF
 
 inline outcome load_bytes(const std::string& bytes, unsigned int piece = 0xFFFFFFFF) {
     const std::filesystem::path path = folder() / "made.zip";
-    put(path, bytes);
+    make_file(path, bytes);
     return load(path, piece);
 }
 

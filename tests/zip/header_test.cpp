@@ -89,7 +89,7 @@ TEST(zip_header, record_of_names_overrides_code_page_and_name) {
     for (const auto& [data, cause, name, name_page, page_of_comment, why] : rows) {
         entry e("content", 0);
         e.extra = hqf::field_writer()(std::uint16_t{0x5A4C})(static_cast<std::uint16_t>(data.size())).get() + data;
-        put(folder() / "names.zip", build({e}).bytes);
+        make_file(folder() / "names.zip", build({e}).bytes);
         CZipArchive zip;
         EXPECT_EQ(cause_of([&] { zip.Open(wide(folder() / "names.zip"), 1); }), cause) << why;
         if (cause != 0) continue;

@@ -111,7 +111,7 @@ void fail_each_call(way how, int least, Action action, Judge may_end_with) {
 TEST(zip_io_failure, load_fails_with_the_error_of_any_call) {
     const auto path = folder() / "io.zip";
     for (const std::uint16_t method : std::initializer_list<std::uint16_t>{0, 8, 12}) {
-        put(path, build({entry(sample_text(300000), method)}, "comment").bytes);
+        make_file(path, build({entry(sample_text(300000), method)}, "comment").bytes);
         const auto load_it = [&] { return load(path).cause; };
         // EDQUOT has the number 122 here, which as a cause means something else.
         fail_each_call(way::error, 15, load_it, [](int cause) { return cause == ENOSPC; });
@@ -125,7 +125,7 @@ TEST(zip_io_failure, save_fails_or_is_whole) {
     std::string noise = sample_text(200000);
     for (std::size_t i = 0; i < noise.size(); ++i)
         noise[i] = static_cast<char>(noise[i] * 31 + static_cast<int>(i * i >> 7));
-    put(source, noise);
+    make_file(source, noise);
     const auto save = [&] {
         CZipArchive zip;
         const int cause = cause_of([&] {

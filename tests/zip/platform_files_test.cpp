@@ -67,11 +67,11 @@ TEST(zip_file, flags_decide_what_open_does) {
     for (const auto& [is_there, flags, cause, content, why] : rows) {
         const auto path = folder() / "flags";
         std::filesystem::remove(path);
-        if (is_there) put(path, "old");
+        if (is_there) make_file(path, "old");
         CZipFile tested;
         EXPECT_EQ(cause_of([&, mode = flags] { tested.Open(wide(path), mode, true); }), cause) << why;
         EXPECT_EQ(tested.IsClosed(), cause != 0) << why;
-        EXPECT_EQ(get(path), content) << why;
+        EXPECT_EQ(bytes_of(path), content) << why;
     }
 }
 
@@ -97,7 +97,7 @@ TEST(zip_file, reads_writes_and_fails_by_errno) {
     file.Close();
     file.Close();
     EXPECT_EQ(cause_of([&] { file.Flush(); }), EBADF);
-    EXPECT_EQ(get(path), "0123");
+    EXPECT_EQ(bytes_of(path), "0123");
     EXPECT_EQ(cause_of([&] { file.Open(wide(folder()), 0x45, true); }), EISDIR);
     EXPECT_FALSE(file.Open(wide(folder()), 0x45, false));
     hqf::file_status status;

@@ -13,7 +13,7 @@ const auto path = folder() / "read.zip";
 
 /// Opens, reads and closes the first entry with `zip` as it is set; the cause, or 0 when all was well.
 int read_with(CZipArchive& zip, const std::string& bytes) {
-    put(path, bytes);
+    make_file(path, bytes);
     zip.Open(wide(path), CZipStorage::openReadOnly);
     return cause_of([&] {
         std::string content(zip.GetFileInfo(0)->GetUncompressedSize(), '\0');
@@ -59,7 +59,7 @@ TEST(zip_storage, locates_the_last_signature) {
         {behind_nine + std::string(32768 - 3, 'y'), 0xFFFFFFFF, 9, "one byte in the first chunk"},
     };
     for (const auto& [bytes, depth, position, why] : rows) {
-        put(path, bytes);
+        make_file(path, bytes);
         CZipStorage storage;
         ASSERT_TRUE(storage.Open(wide(path), CZipStorage::openReadOnly));
         EXPECT_EQ(storage.LocateSignature(0x06054B50, depth), position) << why;
@@ -67,7 +67,7 @@ TEST(zip_storage, locates_the_last_signature) {
 }
 
 TEST(zip_read, misuse_is_told_by_results) {
-    put(path, build({entry("abcdefgh", 0), entry("second", 8)}).bytes);
+    make_file(path, build({entry("abcdefgh", 0), entry("second", 8)}).bytes);
     CZipArchive zip;
     char bytes[8];
     EXPECT_FALSE(zip.GetFileInfo(0) || zip.OpenFile(0) || zip.ReadFile(bytes, 1) || zip.CloseFile()) << "not open";
@@ -98,8 +98,8 @@ TEST(zip_read, misuse_is_told_by_results) {
 TEST(zip_read, close_file_hands_time_and_attributes_to_a_file) {
     entry e("abc", 0);
     e.external = 0x01;
-    put(path, build({e}).bytes);
-    put(folder() / "unpacked", "abc");
+    make_file(path, build({e}).bytes);
+    make_file(folder() / "unpacked", "abc");
     CZipArchive zip;
     zip.Open(wide(path), CZipStorage::openReadOnly);
     char bytes[3];
@@ -140,13 +140,25 @@ TEST(zip_read, consistency_flags_switch_single_checks_off) {
         zip.SetConsistencyFlags(off);
         EXPECT_EQ(read_with(zip, made.bytes), cause) << broken << " with " << off;
     }
-    for (const char* signature : {"", "PK\7\b"}) {
-        entry e("content", 8);
-        e.flags = 8;
-        e.behind_data = signature + hqf::field_writer()(e.crc)(e.packed_size)(e.size).get();
-        CZipArchive zip;
-        zip.SetConsistencyFlags(0);
-        EXPECT_EQ(read_with(zip, build({e}).bytes), 0) << "a sound descriptor with signature '" << signature << "'";
+    for (const std::string signature : {"", "PK\7\b"})
+        for (const int wrong : {0, 1, 2, 3}) { // none, or one field of the descriptor
+            entry e("content", 8);
+            e.flags = 8;
+            hqf::field_writer descriptor;
+            descriptor(e.crc + (wrong == 1))(e.packed_size + (wrong == 2))(e.size + (wrong == 3));
+            e.behind_data = signature + descriptor.get();
+            CZipArchive zip;
+            zip.SetConsistencyFlags(0);
+            EXPECT_EQ(read_with(zip, build({e}).bytes), wrong == 0 ? 0 : 101) << wrong << signature;
+        }
+}
+
+TEST(zip_read, one_zero_byte_is_made_up_behind_a_deflated_stream) {
+    // A NUL, deflated, is 63 00 00; with one byte alone the text is there, but no end.
+    for (const auto& [packed_size, cause] : {std::pair{3U, 0}, {2U, 0}, {1U, 101}}) {
+        entry e(std::string(1, '\0'), 8);
+        e.data.resize(e.packed_size = packed_size);
+        EXPECT_EQ(load_bytes(build({e}).bytes).cause, cause) << packed_size;
     }
 }
 

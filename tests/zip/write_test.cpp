@@ -51,13 +51,13 @@ TEST(zip_write, a_packed_file_has_exactly_this_shape) {
     std::filesystem::create_directories(folder() / "dir");
     const auto source = folder() / "dir" / "a.hqf";
     for (const std::string& content : {std::string("1234"), std::string("12345"), sample_text(200000)}) {
-        put(source, content);
+        make_file(source, content);
         ASSERT_TRUE(hqf::set_file_time(wide(source), begin + 1));
         new_archive zip;
         ASSERT_TRUE(zip.AddNewFile(wide(source), -1, false, 7, 65536));
         zip.Close();
         const entry expected(content, content.size() < 5 ? 0 : 8);
-        EXPECT_TRUE(get(path) == build({expected}).bytes) << content.size();
+        EXPECT_TRUE(bytes_of(path) == build({expected}).bytes) << content.size();
     }
 }
 
@@ -101,7 +101,7 @@ TEST(zip_write, misuse_is_told_by_results) {
 TEST(zip_write, names_of_entries_come_from_the_path) {
     const auto dir = folder() / "names" / "sub";
     std::filesystem::create_directories(dir);
-    put(dir / "file.hqf", "content");
+    make_file(dir / "file.hqf", "content");
     const std::string full = dir.string().substr(1);
     const std::tuple<std::wstring, bool, std::string> rows[] = {{L"/file.hqf", false, "file.hqf"},
                                                                 {L"/file.hqf", true, full + "/file.hqf"},
@@ -165,11 +165,11 @@ TEST(zip_write, adds_behind_what_is_there) {
     entry first("first", 8);
     first.made_by = 3 << 8 | 30;
     const std::string before = "front" + build({first}, "comment").bytes;
-    put(path, before);
+    make_file(path, before);
     CZipArchive zip;
     ASSERT_TRUE(zip.Open(wide(path), CZipStorage::openExisting));
     zip.Close();
-    EXPECT_EQ(get(path), before) << "nothing added, nothing written";
+    EXPECT_EQ(bytes_of(path), before) << "nothing added, nothing written";
     ASSERT_TRUE(zip.Open(wide(path), CZipStorage::openExisting));
     CZipFileHeader header = named(L"b");
     header.SetSystemAttr(0x20);
@@ -177,16 +177,16 @@ TEST(zip_write, adds_behind_what_is_there) {
     EXPECT_EQ(zip.GetFileInfo(1)->GetExternalAttr(), 0x81B40000U) << "a new entry takes the archive's host";
     add(zip, L"c", "third", 0);
     zip.Close();
-    EXPECT_EQ(get(path).substr(0, 5) + get(path).substr(get(path).size() - 7), "frontcomment");
+    EXPECT_EQ(bytes_of(path).substr(0, 5) + bytes_of(path).substr(bytes_of(path).size() - 7), "frontcomment");
     EXPECT_EQ(contents(), "first||third|");
 
     // An archive behind a file that is none.
-    put(path, "a program");
+    make_file(path, "a program");
     EXPECT_EQ(cause_of([&] { zip.Open(wide(folder() / "none"), CZipStorage::append); }), ENOENT);
     ASSERT_TRUE(zip.Open(wide(path), CZipStorage::append));
     add(zip, L"a", "first");
     zip.Close();
-    EXPECT_EQ(get(path).substr(0, 9), "a program");
+    EXPECT_EQ(bytes_of(path).substr(0, 9), "a program");
     EXPECT_EQ(contents(), "first|");
 }
 
