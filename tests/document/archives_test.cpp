@@ -6,6 +6,7 @@
 #include <cerrno>
 #include <cstdlib>
 #include <ctime>
+#include <iostream>
 #include <set>
 #include <sstream>
 
@@ -58,7 +59,7 @@ TEST(archives, samples_load_or_fail_as_their_table_says) {
 }
 
 TEST(archives, what_stands_around_and_in_the_entry) {
-    const document_test::folder place;
+    const support::folder place;
     const auto sound = [](const std::string& comment = "") { return build({entry(chart, 8)}, comment).bytes; };
     const auto named = [](const std::string& content, const std::string& entry_name) {
         entry made(content, 8);
@@ -93,17 +94,6 @@ TEST(archives, what_stands_around_and_in_the_entry) {
     }
 }
 
-TEST(archives, a_broken_document_gives_what_the_plain_one_gives) {
-    const document_test::folder place;
-    for (const auto& [name, text] : support::documents("bad")) {
-        make_file(place / "a.hqfz", build({entry(text, 8)}).bytes);
-        hqf_v2::Hqf packed, plain;
-        const std::string code = loading(packed, place / "a.hqfz");
-        EXPECT_EQ(code, std::to_string(plain.unmarshal(text))) << name;
-        EXPECT_TRUE(hqf::equal(packed, plain)) << name << ": what was read before the failure";
-    }
-}
-
 /// The archive that `writeFile` has to make of a plain file, at the time that the found one tells.
 archive expected_archive(const std::string& plain, const std::string& found, std::time_t& time) {
     entry made(plain, 8);
@@ -118,7 +108,7 @@ archive expected_archive(const std::string& plain, const std::string& found, std
 }
 
 TEST(archives, written_byte_for_byte_and_nothing_beside) {
-    const document_test::folder place;
+    const support::folder place;
     hqf_v2::Hqf document;
     ASSERT_EQ(document.unmarshal(chart), 0);
     ASSERT_EQ(writing(document, place / "plain.hqf"), "0");
@@ -145,7 +135,7 @@ TEST(archives, written_byte_for_byte_and_nothing_beside) {
 }
 
 TEST(archives, failures_tell_what_failed_and_leave_what_they_must) {
-    const document_test::folder place;
+    const support::folder place;
     const auto xml = place / "a.hqf", packed = place / "a.hqfz";
     hqf_v2::Hqf incomplete, small, large;
     document_test::fill_header(small);
@@ -182,41 +172,34 @@ TEST(archives, failures_tell_what_failed_and_leave_what_they_must) {
         }
 }
 
-struct program {
-    const char *name, *command;
-};
-class other_programs : public testing::TestWithParam<program> {};
-
 /// Each lists one entry of the right name, tests it, and gives back the plain file.
-TEST_P(other_programs, open_what_is_written) {
-    const auto& [name, command] = GetParam();
-    if (std::system((std::string("command -v ") + name + " >/dev/null").c_str()) != 0)
-        GTEST_SKIP() << name << " is not on this machine";
-    const document_test::folder place;
+TEST(archives, other_programs_open_what_is_written) {
+    const support::folder place;
     hqf_v2::Hqf document;
     ASSERT_EQ(document.unmarshal(chart), 0);
     ASSERT_EQ(writing(document, place / "a.hqfz"), "0");
     ASSERT_EQ(writing(document, place / "plain.hqf"), "0");
     ::setenv("ARCHIVE", (place / "a.hqfz").c_str(), 1);
     ::setenv("PLAIN", (place / "plain.hqf").c_str(), 1);
-    EXPECT_EQ(std::system(command), 0) << command;
-}
-
-INSTANTIATE_TEST_SUITE_P(
-    archives, other_programs,
-    testing::Values(
-        program{"unzip", R"sh(test "$(unzip -Z1 "$ARCHIVE")" = a.hqf && unzip -tqq "$ARCHIVE" &&
-                            unzip -p "$ARCHIVE" | cmp - "$PLAIN")sh"},
-        program{"bsdtar", R"sh(test "$(bsdtar -tf "$ARCHIVE")" = a.hqf && bsdtar -xOf "$ARCHIVE" | cmp - "$PLAIN")sh"},
-        program{"7z", R"sh(7z t "$ARCHIVE" >/dev/null && 7z e -so "$ARCHIVE" a.hqf | cmp - "$PLAIN")sh"},
-        program{"python3", R"sh(python3 -c 'if True:
+    const std::pair<std::string, const char*> programs[] = {
+        {"unzip", R"sh(test "$(unzip -Z1 "$ARCHIVE")" = a.hqf && unzip -tqq "$ARCHIVE" &&
+                       unzip -p "$ARCHIVE" | cmp - "$PLAIN")sh"},
+        {"bsdtar", R"sh(test "$(bsdtar -tf "$ARCHIVE")" = a.hqf && bsdtar -xOf "$ARCHIVE" | cmp - "$PLAIN")sh"},
+        {"7z", R"sh(7z t "$ARCHIVE" >/dev/null && 7z e -so "$ARCHIVE" a.hqf | cmp - "$PLAIN")sh"},
+        {"python3", R"sh(python3 -c 'if True:
             import os, zipfile
             archive = zipfile.ZipFile(os.environ["ARCHIVE"])
             (entry,) = archive.infolist()
             assert archive.testzip() is None
             assert (entry.filename, entry.compress_type) == ("a.hqf", zipfile.ZIP_DEFLATED)
             assert archive.comment == entry.comment == entry.extra == b""
-            assert archive.read(entry) == open(os.environ["PLAIN"], "rb").read()')sh"}),
-    [](const auto& each) { return "with_" + std::string(each.param.name); });
+            assert archive.read(entry) == open(os.environ["PLAIN"], "rb").read()')sh"},
+    };
+    for (const auto& [name, command] : programs) {
+        const bool is_here = std::system(("command -v " + name + " >/dev/null").c_str()) == 0;
+        EXPECT_TRUE(!is_here || std::system(command) == 0) << command;
+        if (!is_here) std::cout << name << " is not on this machine\n";
+    }
+}
 
 } // namespace

@@ -3,41 +3,12 @@
 
 #include <gtest/gtest.h>
 
-#include <cstdlib>
-#include <map>
-#include <new>
 #include <set>
 #include <sstream>
 
 #include "tests/document/support.h"
 #include "tests/support/documents.h"
-
-namespace {
-
-std::size_t allocated = 0; // bytes since the last reset, given back or not
-
-} // namespace
-
-// Counts what a load asks for: no document may cost memory that it hasn't paid for. The thread sanitizer has operators
-// of its own and lets nobody replace them; nothing is counted there. Valgrind takes their place by name: no inlining.
-#if defined(__has_feature)
-#if __has_feature(thread_sanitizer)
-#define HQF_NO_COUNT
-#endif
-#endif
-#if !defined(HQF_NO_COUNT)
-[[gnu::noinline]] void* operator new(std::size_t size) {
-    allocated += size;
-    if (void* const block = std::malloc(size == 0 ? 1 : size)) return block;
-    throw std::bad_alloc();
-}
-[[gnu::noinline]] void operator delete(void* block) noexcept {
-    std::free(block);
-}
-[[gnu::noinline]] void operator delete(void* block, std::size_t) noexcept {
-    std::free(block);
-}
-#endif
+#include "tests/support/memory.h"
 
 namespace {
 
@@ -88,11 +59,12 @@ TEST(samples, broken_documents) {
         ASSERT_FALSE(why.empty()) << row;
         listed.insert("bad/" + name);
         const std::string text = support::document("bad/" + name);
-        allocated = 0;
+        const std::int64_t before = support::bytes_asked;
         hqf_v2::Hqf document;
         lmx::c_xml_reader_memory reader(text.data(), static_cast<unsigned int>(text.size()));
         const int found = document.unmarshal(reader);
-        EXPECT_LT(allocated, 16'000'000 + 100 * text.size()) << row;
+        // No document may cost memory that it hasn't paid for.
+        EXPECT_LT(support::bytes_asked - before, static_cast<std::int64_t>(16'000'000 + 100 * text.size())) << row;
         if (code == "*") continue;
         const bool loads = code.rfind("write ", 0) == 0;
         EXPECT_EQ(loads ? written(document) : std::to_string(found), loads ? "code " + code.substr(6) : code) << row;
