@@ -161,19 +161,6 @@ TEST(entity_stream, values_come_in_place_of_the_document) {
     EXPECT_FALSE(r.in.get_general_entity("a", &value)) << "rewinding forgets entities";
 }
 
-TEST(repository, is_an_ordered_list_also_where_it_is_long) {
-    for (const int count : {3, 40}) {
-        lmx::c_repository<int> numbers;
-        for (int i = 0; i < count; ++i)
-            numbers.add(("k" + std::to_string(i)).c_str(), i < 2 ? 7 : i);
-        EXPECT_STREQ(numbers.find_key(7), "k0") << "the first key of a value";
-        numbers.add("k0", 8);
-        int value = 0;
-        EXPECT_TRUE(numbers.find("k0", &value) && value == 8) << "the last definition wins";
-        EXPECT_STREQ(numbers.find_key(7), "k1");
-    }
-}
-
 const std::string unrecognised = " {0 6 Unrecognised character encoding}";
 
 // All there is; and the same again after a rewind, wherever the first reading stopped.
@@ -190,30 +177,8 @@ std::string decoded(lmx::c_read& source) {
     return first;
 }
 
-TEST(decoding, finds_the_encoding_from_the_first_bytes) {
-    const given stream{decoded};
-    stream.from_every_source(rows("@1" + unrecognised, {"\xEF\xBB<a>", "\xFF\xFE\xE9\x00"s, "\xFF\xFE\x00\x00"s,
-                                                        "\xFE\xFF\x01<", "\xFF<", "\0a"s, "a<"}));
-    stream.from_every_source(rows("<a>@1", {"<a>", "\xEF\xBB\xBF<a>", "\xFF\xFE<\0a\0>\0"s, "\xFE\xFF\0<\0a\0>"s}));
-    stream.from_every_source(rows("@1", {"", "\xEF\xBB\xBF"}));
-    stream.from_every_source({is(" \0<\0a\0"s, " <a@1", "UTF-16 without mark"),
-                              is("\0\n\0<\0a"s, "<10><a@2", "big-endian"), is(" ", " @1", "a blank alone"),
-                              is("<\xC3\xA9>", "<\xC3\xA9>@1", "several bytes"), is("<\xC3", "<@1", "cut off"),
-                              is("\n\r\n<", "<10><10><@3", "CR LF first"),
-                              is("\n\xE2\x80\xA8<", "<10><10><@3", "U+2028")});
-}
-
-TEST(decoding, folds_line_ends_and_ends_at_what_is_no_character) {
-    const given stream{decoded};
-    stream.from_every_source(
-        {is("<\ra\nb\r\nc\n\rd\r\n\n", "<<10>a<10>b<10>c<10><10>d<10><10>@8", "CR, LF and CR LF are one line end each"),
-         is("<\xC2\x85\xE2\x80\xA8\xE2\x80\xA9", "<<10><10>\xE2\x80\xA9@3", "U+0085 and U+2028, but not U+2029"),
-         is("<\xF0\x9D\x84\x9E", "<\xF0\x9D\x84\x9E@1", "four bytes"),
-         is("<a\xE1zzb", "<a\xE1zzb@1", "the bytes behind the second one are not looked at, nor that one always"),
-         is("<a\xE1\x82\0b"s, "<a\xE1\x82"s + "b@1", "a NUL cuts its sequence short")});
-    // A surrogate, a continuation byte alone, an overlong lead, five bytes, too large a number, a sequence cut off.
-    stream.from_every_source(rows("<a@1", {"<a\xED\xA0\x80z", "<a\x80z", "<a\xC0\x80z", "<a\xF8\x88\x80\x80\x80z",
-                                           "<a\xF4\x90\x80\x80z", "<a\xE2\x82"}));
+TEST(decoding, finds_the_encoding_and_ends_at_what_is_no_character) {
+    given{decoded}.from_every_source(cases("decoded"));
     reading<lmx::c_get_as_utf8> r("<\x80z"s);
     EXPECT_EQ(next(r.in, 3), "<\xFFz") << "what is no UTF-8 reads as the end, right behind the first character too";
 }

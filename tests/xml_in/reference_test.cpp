@@ -26,47 +26,6 @@ TEST(reference, names_a_character) {
     }
 }
 
-TEST(entity, definitions_of_the_internal_subset) {
-    const std::string rows[][4] = {
-        {"<!ENTITY e \"v\">", "<a b='x&e;y'>x&e </a>", "<a b='xvy'>[xv ]</a>.", "the semicolon may be missing"},
-        {"<!ENTITY e '<b/><b>'><!ENTITY f 'x</b'>", "<a>&e;&f;></a>", "<a><b/><b>[x]</b></a>.", "even half a tag"},
-        {"<!ENTITY e ''><!ENTITY f '1'><!ENTITY f '2'><!ENTITY g 'x\"y'><!ENTITY lt 'z'>", "<a>&e;&f;&g;&e;&lt;",
-         "<a>[2x\"y<].", "no text, the later one, the other quote, the predefined"},
-        {"<!ENTITY f 'v'><!ENTITY e '&f;a&#38;#66;'><!ENTITY f 'w'>", "<a>&e;", "<a>[waB].", "numbers go first"},
-        {"<!ENTITY e '5%'>", "<a>&e;", "<a>[5]. {1 41 Entity '%' not found}", "a percent sign is a reference"},
-        {"<!ENTITY e '5&#37;'>", "<a b='&e;'>&e;", "<a b=!>[5%].", "written as a number only in an attribute"},
-        {"<!ENTITY % p 'a\"b'><!ENTITY e \"%p;w\">", "<a>&e;", "<a>[a\"bw].", "its quote ends nothing"},
-        {"<!ENTITY % p \"<!ENTITY e 'x'>\"> %p;", "<a>&e;", "<a>[x].", "or a declaration"},
-        {"<!ENTITY % p 'e'><!ENTITY %p; 'x'>", "<a>&e;", "<a>!", "% before a name makes a parameter entity"},
-        {"%p;<!ENTITY e 'v'>", "<a>&e;", "<a>[v]. {1 41 Entity '%p' not found}", "an unknown one"},
-        {"<!ENTITY e SYSTEM 'u'><!ENTITY f 'v'>", "<a>&f;<b/>&e;",
-         "<a>[v]<b/>! {2 17 External Entity definitions not supported}", "an external one: a warning, not defined"},
-        {"<!ENTITY e FOO 'u'><!ENTITY f 'v'>", "<a>&f;", "<a>[v]. {1 33 Unexpected value in Entity definition: FOO}",
-         "another word an error"},
-        {"<!-- > ' --><?p ]>?><!ELEMENT a ANY><!ATTLIST a b CDATA '>'><!NOTATION n PUBLIC 'p'><!ENTITY e 'v'>",
-         "<a>&e;", "<a>[v].", "comments, instructions and other declarations"},
-    };
-    for (const auto& [subset, content, transcript, why] : rows) {
-        std::string expected = transcript;
-        expected.insert(std::min(expected.find(" {"), expected.size()), "@1");
-        given{tokens}.everywhere({{"<!DOCTYPE a [ " + subset + " ]>" + content, expected, why}});
-    }
-}
-
-TEST(document_type, is_read_once_and_first) {
-    given{tokens}.everywhere(
-        {is("<!DOCTYPE a><!DOCTYPE a>", "!@1 {1 9 Document Type Declaration already read}"),
-         is("<a><!DOCTYPE a>", "<a>!@1 {1 9 Document Type Declaration not at start of document}"),
-         is("<!DOCTYPE a [<!ENTITY % p '&#37;p;'> %p; ]>", "!@1 {0 9 Recursive entity definition for: %p;}")});
-    const std::string fault = "!@1 {0 9 DTD not Well Formed (";
-    given{tokens}.everywhere({is("<!DOCTYPE a [x]>", fault + "got x)}"), is("<!DOCTYPE a [", fault + "got )}"),
-                              is("<!DOCTYPE a []x>", fault + "expected '>', got x)}"),
-                              is("<!DOCTYPE a [<!ENTITY e 'x", fault + "got )}")});
-    given{tokens}.everywhere(rows("<a/>.@1", {"<!DOCTYPE a><a/>", "<!DOCTYPE a SYSTEM \"x\"><a/>"}));
-    given{tokens}.everywhere(rows("!@1", {"<!DOCTYPE a", "<!DOCTYPE a [<!ELEMENT", "<!DOCTYPE a [<!--",
-                                          "<!DOCTYPE a [<!ENTITY", "<!DOCTYPE a [<!ENTITY e '&#X;'>]>"}));
-}
-
 TEST(entity, application_can_define_some_before_the_document) {
     for (const bool expands : {true, false}) {
         reading<lmx::c_xml> r("<a b='&g;'>&g;&lt;</a>"s, true);

@@ -5,31 +5,21 @@
 #include "hqf/xml_in/c_read_file.h"
 #include "hqf/xml_in/c_read_string.h"
 #include "hqf/xml_in/c_xml.h"
+#include "tests/support/callers_source.h"
+#include "tests/support/documents.h"
+#include "tests/support/files.h"
 
 #include <gtest/gtest.h>
 
 #include <cstdio>
-#include <fstream>
 #include <functional>
+#include <sstream>
 #include <string>
 #include <vector>
 
-#include <unistd.h>
-
 namespace xml_in_test {
 
-/// A source as an application would write one.
-class callers_source : public lmx::c_read {
-public:
-    explicit callers_source(std::string bytes = {})
-        : bytes_(std::move(bytes)) {}
-    int read() override { return next_ < bytes_.size() ? static_cast<unsigned char>(bytes_[next_++]) : -1; }
-    void rewind() override { next_ = 0; }
-
-private:
-    std::string bytes_;
-    std::size_t next_ = 0;
-};
+using support::callers_source;
 
 /// Writes down each report as " {grade code text}".
 struct recorder : lmx::c_error {
@@ -42,14 +32,10 @@ struct recorder : lmx::c_error {
     int last_line = 0;
 };
 
-/// A file in the temporary folder, deleted at the end.
-struct temporary_file {
-    explicit temporary_file(const std::string& bytes) { std::ofstream(path, std::ios::binary) << bytes; }
-    temporary_file(const temporary_file&) = delete;
-    temporary_file& operator=(const temporary_file&) = delete;
-    ~temporary_file() { std::remove(path.c_str()); }
-    inline static int count = 0;
-    const std::string path = testing::TempDir() + "xml_in_" + std::to_string(getpid()) + "_" + std::to_string(++count);
+/// A file that is deleted at the end.
+struct temporary_file : support::folder {
+    explicit temporary_file(const std::string& bytes) { support::make_file(path, bytes); }
+    const std::string path = *this / "file";
 };
 
 /// A stream of characters or a tokeniser, with what it needs.
@@ -86,6 +72,37 @@ inline std::vector<row> rows(const std::string& expected, const std::vector<std:
     std::vector<row> out;
     for (const std::string& text : texts)
         out.push_back(is(text, expected));
+    return out;
+}
+
+/// What a text of cases.txt stands for.
+inline std::string unescaped(const std::string& text) {
+    static const std::string letters = "nrtvf\\", characters = "\n\r\t\v\f\\";
+    std::string out;
+    for (std::size_t i = 0; i < text.size(); ++i)
+        if (text[i] != '\\')
+            out += text[i];
+        else if (text[++i] != 'x')
+            out += characters.at(letters.find(text[i]));
+        else
+            out += static_cast<char>(std::stoi(text.substr(i + 1, 2), nullptr, 16)), i += 2;
+    return out;
+}
+
+/// The rows under a heading of cases.txt.
+inline std::vector<row> cases(const std::string& heading) {
+    std::istringstream table(support::document("xml_in/cases.txt"));
+    std::vector<row> out;
+    std::string line, current;
+    while (std::getline(table, line)) {
+        if (!line.empty() && line[0] == '[') current = line;
+        if (current != "[" + heading + "]" || line.find('\t') == std::string::npos || line[0] == '#') continue;
+        std::istringstream fields(line);
+        std::string text, expected, why;
+        std::getline(std::getline(std::getline(fields, text, '\t'), expected, '\t'), why);
+        out.push_back(is(unescaped(text), unescaped(expected), why));
+    }
+    EXPECT_FALSE(out.empty()) << heading;
     return out;
 }
 

@@ -3,9 +3,7 @@
 
 #include "support.h"
 
-#include "hqf/values/s_ns_map.h"
 #include "hqf/xml_in/byte_scan.h"
-#include "hqf/xml_in/c_xml_reader_memory.h"
 #include "hqf/xml_in/reader_access.h"
 
 #include <random>
@@ -130,32 +128,6 @@ TEST(window, opens_only_where_the_library_may_read_ahead) {
         EXPECT_TRUE(w->room(w->p, text.size() - 2 - 68)) << why;
         EXPECT_FALSE(w->room(w->p, text.size() - 2 - 63)) << "64 bytes stay behind the edge, for wide loads: " << why;
     }
-}
-
-// All tags, one scope a level, each with a + where the window opens behind its name.
-std::string walk(lmx::c_xml_reader& reader) {
-    const lmx::c_xml_reader_local scope(&reader);
-    lmx::elmx_error error = lmx::err_no_error;
-    std::string out;
-    for (;;) {
-        reader.get_element_event(nullptr, &error, &reader.item_name);
-        if (!reader.is_current_event_tokenisable()) return out;
-        out += reader.item_name + (reader_access::begin_step(reader) != nullptr ? "+" : "-");
-        bool empty = false;
-        if (reader.skip_start_tag(&empty) && !empty) out += "[" + walk(reader) + "]";
-    }
-}
-
-TEST(window, stays_away_where_the_usual_prefixes_mean_something_else) {
-    const lmx::s_ns_map format[] = {{1000, "Hqf", "urn:f"}, {0, nullptr, nullptr}};
-    const std::string text = "<Hqf:a xmlns:Hqf='urn:f' xmlns:xsi='http://www.w3.org/2001/XMLSchema-instance'>"
-                             "<Hqf:b/><b xmlns:Hqf='urn:g'><c/></b><Hqf:d xmlns:xsi='urn:h'/><Hqf:e xmlns:x='urn:i'/>"
-                             "<Hqf:f/></Hqf:a>" +
-                             std::string(400, ' ');
-    lmx::c_xml_reader_memory reader(text.data(), static_cast<unsigned int>(text.size()));
-    reader.set_ns_map(format);
-    EXPECT_EQ(reader_access::begin_step(reader), nullptr) << "nothing declared yet";
-    EXPECT_EQ(walk(reader), "Hqf:a+[Hqf:b+b-[c-]Hqf:d-Hqf:e+Hqf:f+]");
 }
 
 } // namespace
