@@ -166,6 +166,7 @@ TEST(writer, state_of_the_stream) {
         {"fixed notation, which the first date clears", [](auto& s) { s << std::fixed; }, "0.25", "2147483647"},
         {"scientific notation", [](auto& s) { s << std::scientific; }, "2.50000000000000e-01", "2147483647"},
         {"signs", [](auto& s) { s << std::showpos; }, "+0.25", "2147483647"},
+        {"capitals", [](auto& s) { s << std::uppercase << std::scientific; }, "2.50000000000000E-01", "2147483647"},
         {"hexadecimal", [](auto& s) { s << std::hex; }, "0.25", "7fffffff"},
         {"a locale given after the writer was made",
          [](auto& s) { s.imbue(std::locale(std::locale::classic(), new grouping)); }, "0,25", "2.147.483.647"},
@@ -225,6 +226,10 @@ TEST(writer, incomplete_elements) {
     group.assign_Function(static_cast<FunctionType*>(nullptr));
     EXPECT_EQ(group.marshal(writer, ""), 45) << "chosen, but no object";
     EXPECT_EQ(stream.str(), "");
+    Averaging bare;
+    bare.set_AveragingValue(5);
+    EXPECT_EQ(bare.marshal(writer, "a"), 0) << "an optional body";
+    EXPECT_EQ(stream.str(), "<a AveragingValue=\"5\"></a>\n");
 }
 
 /// An object under the head says what it is; a plain one doesn't, and leaves the question open for the next object.
