@@ -12,6 +12,7 @@
 #include "hqf/xml_in/limits.h"
 #include "hqf/xml_in/reader_access.h"
 #include "tests/support/documents.h"
+#include "tests/support/patterns.h"
 
 namespace {
 
@@ -41,25 +42,9 @@ void on_stack_of(std::size_t bytes, const std::function<void()>& action) {
     pthread_attr_destroy(&attributes);
 }
 
-std::string repeated(const std::string& text, unsigned int count) {
-    std::string result;
-    for (; count != 0; --count)
-        result += text;
-    return result;
-}
-
 /// A document whose one colour has so many parents in one another, in the spelling of our writer or in another.
 std::string nested_parents(unsigned int count, bool plain) {
-    const std::string date = "<Hqf:ChangeHistory>2024-05-01T09:00:00Z</Hqf:ChangeHistory>";
-    const std::string nil = "<Hqf:ColorSpaceSpecificationSpectrumGeneric xsi:nil=\"true\"/>";
-    const std::string open =
-        plain ? "<Hqf:ColorSpaceNCS><Hqf:ParentColorSpace>" : "<Hqf:ColorSpaceNCS ><Hqf:ParentColorSpace >";
-    const std::string close =
-        "</Hqf:ParentColorSpace>" + date + nil + "<Hqf:ColorName>n</Hqf:ColorName></Hqf:ColorSpaceNCS>";
-    std::string text = support::document("syntax/plain.hqf");
-    text.resize(text.find("</Hqf:Preamble>") + 15);
-    return text + "<Hqf:Color ColorName=\"c\">" + date + repeated(open, count) + "<Hqf:ColorSpaceNCS>" + date + nil +
-           "<Hqf:ColorName>n</Hqf:ColorName></Hqf:ColorSpaceNCS>" + repeated(close, count) + "</Hqf:Color></Hqf:Hqf>\n";
+    return support::patterned_document({.in_colour = support::nested(plain ? "" : " ")}, count);
 }
 
 /// Hqf, Color and the innermost form stand beside the parents, each of which is two elements.
@@ -94,29 +79,22 @@ TEST(limits, objects_at_the_limit_need_little_stack) {
 }
 
 TEST(limits, foreign_and_skipped_elements) {
-    const auto deep = [](unsigned int count) { return repeated("<x>", count) + repeated("</x>", count); };
-    const std::string text = support::document("syntax/plain.hqf");
-    const std::size_t revision = text.find("\t\t</Hqf:Header>");
-    const auto with_revision = [&](unsigned int depth) {
-        return text.substr(0, revision) + "<Hqf:Revision>" + deep(depth) + "</Hqf:Revision>" + text.substr(revision);
-    };
-    hqf_v2::Hqf captured;
-    EXPECT_EQ(captured.unmarshal(with_revision(hqf::limits::capture_depth)), 0);
-    hqf_v2::Hqf too_deep;
-    EXPECT_EQ(too_deep.unmarshal(with_revision(10000)), 29);
-
-    // In the place of a mandatory group any element is passed over, down to a depth.
-    const auto with_sample = [&](unsigned int depth) {
-        std::string record = support::document("documents/quality-control.hqf");
-        const std::size_t sample = record.find("<Hqf:PhysicalSample>") + 20;
-        return record.substr(0, sample) + deep(depth) + record.substr(record.find("</Hqf:PhysicalSample>", sample));
-    };
-    hqf_v2::Hqf skipped;
-    EXPECT_EQ(skipped.unmarshal(with_sample(hqf::limits::skip_depth)), 0);
-    std::string out;
-    EXPECT_EQ(skipped.marshal(&out), 46) << "but then there is no sample";
-    hqf_v2::Hqf refused;
-    EXPECT_EQ(refused.unmarshal(with_sample(10000)), 10);
+    const std::string nested = "{<x>}{</x>}", record = support::document("documents/quality-control.hqf");
+    const std::size_t sample = record.find("<Hqf:PhysicalSample>") + 20, end = record.find("</Hqf:Physical", sample);
+    using hqf::limits::capture_depth, hqf::limits::skip_depth;
+    static_assert(capture_depth == skip_depth);
+    for (const auto& [depth, captures, skips] :
+         {std::tuple{skip_depth, 0, 0}, {skip_depth + 1, 29, 10}, {1000000u, 29, 10}}) {
+        const std::string kept = support::patterned_document({.header = support::element("Revision", nested)}, depth);
+        EXPECT_EQ(hqf_v2::Hqf().unmarshal(kept), captures) << depth;
+        // In the place of a mandatory group any element is passed over, but then there is no sample to write.
+        hqf_v2::Hqf passing;
+        EXPECT_EQ(passing.unmarshal(record.substr(0, sample) + support::expanded(nested, depth) + record.substr(end)),
+                  skips)
+            << depth;
+        std::string out;
+        EXPECT_EQ(passing.marshal(&out), 46) << depth;
+    }
 }
 
 /// In the spelling of our own writer nearly everything is read in the window.

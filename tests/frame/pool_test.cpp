@@ -3,7 +3,6 @@
 
 #include <atomic>
 #include <cstdint>
-#include <cstdlib>
 #include <new>
 #include <set>
 #include <thread>
@@ -12,47 +11,11 @@
 #include <gtest/gtest.h>
 
 #include "hqf/hqf.h"
+#include "tests/support/memory.h"
 
 namespace {
 
-std::atomic<std::int64_t> bytes_in_use = 0;
-
-} // namespace
-
-// The sanitizers bring operators of their own, and so does Valgrind, by name: hence no inlining here.
-#if !defined(__SANITIZE_ADDRESS__) && !defined(__SANITIZE_THREAD__) && !defined(__clang__)
-
-// The size stands before each block, which stays on 16 bytes.
-[[gnu::noinline]] void* operator new(std::size_t size) {
-    auto* const block = static_cast<std::size_t*>(std::malloc(size + 16));
-    if (block == nullptr) throw std::bad_alloc();
-    *block = size;
-    bytes_in_use += static_cast<std::int64_t>(size);
-    return block + 2;
-}
-[[gnu::noinline]] void operator delete(void* object) noexcept {
-    if (object == nullptr) return;
-    auto* const block = static_cast<std::size_t*>(object) - 2;
-    bytes_in_use -= static_cast<std::int64_t>(*block);
-    std::free(block);
-}
-[[gnu::noinline]] void operator delete(void* object, std::size_t) noexcept {
-    operator delete(object);
-}
-#endif
-
-namespace {
-
-using hqf_v2::ColorType;
-
-/// Whether the operators above are the ones in use.
-bool counts_bytes() {
-    const std::int64_t before = bytes_in_use;
-    void* const block = ::operator new(1);
-    const bool counted = bytes_in_use != before;
-    ::operator delete(block);
-    return counted;
-}
+using hqf_v2::ColorType, support::bytes_in_use, support::counts_memory;
 
 /// Classes of an application: larger than any of ours, larger than any slot, and with an alignment of its own.
 struct large : ColorType {
@@ -152,7 +115,7 @@ TEST(pool, threads_free_what_others_made) {
     for (int i = 0; i < 20; ++i)
         round();
     // What is kept: a small block for each size, for each thread that was there at a time.
-    if (counts_bytes()) {
+    if (counts_memory()) {
         EXPECT_LT(bytes_in_use - before, 6 * 32 * 1024);
     }
 }
@@ -163,11 +126,11 @@ TEST(pool, memory_comes_back_at_once) {
     const std::int64_t before = bytes_in_use;
     auto* const color = new ColorType;
     fill(*color, 20000);
-    if (counts_bytes()) {
+    if (counts_memory()) {
         EXPECT_GT(bytes_in_use - before, 20000 * 100);
     }
     delete color;
-    if (counts_bytes()) {
+    if (counts_memory()) {
         EXPECT_LT(bytes_in_use - before, 32 * 1024);
     }
     delete kept;
