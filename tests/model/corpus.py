@@ -285,6 +285,10 @@ class Corpus:
             if place.type:
                 code = getattr(place, "simple_type_error", None) or 10
                 good = self.child(place)
+                for inner in (replace(good, inner="<!-- -->"),
+                              Element(place.name, [], "", f"<![CDATA[{good.content}]]>")):
+                    self.case("markup in a value", place.name, self.with_child(place, inner),
+                              written=self.with_child(place, good))
                 for family, bad in (("end tag", replace(good, end="Wrong")),
                                     ("child in a value", replace(good, inner="<Hqf:Inner/>"))):
                     self.case(family, place.name, self.with_child(place, bad), code, q(place.name))
@@ -515,6 +519,8 @@ def setter_values(type_):
     elif type_.kind == "double":
         low = 0 if type_.minimum is None else 37
         yield from [(value(type_), 0), ("nan", low), ("-infinity", low), ("infinity", 36 if type_.maximum else 0)]
+        if type_.minimum == "0":
+            yield "-0.0", 37 if type_.minimum_exclusive else 0
         for bound, exclusive, outward, code in (
                 (type_.minimum, type_.minimum_exclusive, -math.inf, 37),
                 (type_.maximum, type_.maximum_exclusive, math.inf, 36)):

@@ -9,20 +9,9 @@
 
 #include "hqf/hqf.h"
 #include "tests/model/corpus.h"
+#include "tests/support/callers_source.h"
 
 namespace {
-
-class one_byte_source : public lmx::c_read {
-public:
-    explicit one_byte_source(std::string_view text)
-        : text_(text) {}
-    int read() override { return at_ < text_.size() ? static_cast<unsigned char>(text_[at_++]) : -1; }
-    void rewind() override { at_ = 0; }
-
-private:
-    std::string_view text_;
-    std::size_t at_ = 0;
-};
 
 /// Loads and, after a load without an error, writes. Gives what went against the case, or an empty text.
 std::string fault(const corpus::test_case& test, lmx::c_xml_reader& reader) {
@@ -50,7 +39,7 @@ TEST(corpus, every_case) {
     for (const corpus::test_case& test : cases) {
         ++families[std::string(test.family)];
         lmx::c_xml_reader_memory memory(test.document.data(), static_cast<unsigned int>(test.document.size()));
-        one_byte_source bytes_one_by_one(test.document);
+        support::callers_source bytes_one_by_one{std::string(test.document)};
         lmx::c_xml_reader general(bytes_one_by_one);
         for (const auto& [road, found] : {std::pair("memory", fault(test, memory)), {"bytes", fault(test, general)}})
             if (!found.empty() && ++faults <= 40)

@@ -4,36 +4,28 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
-#include <filesystem>
-#include <fstream>
 #include <iterator>
 #include <sstream>
 
-#include <unistd.h>
-
 #include "hqf/hqf.h"
 #include "tests/model/corpus.h"
+#include "tests/support/files.h"
 
 namespace {
-
-std::string in_file(const std::string& path) {
-    std::ifstream file(path, std::ios::binary);
-    return {std::istreambuf_iterator<char>(file), {}};
-}
 
 template<class model_class>
 void enter(const std::string& name, const std::string& text, int code_when_new) {
     SCOPED_TRACE(name);
     const unsigned int size = static_cast<unsigned int>(text.size());
-    const std::string path = testing::TempDir() + "hqf_entry_" + std::to_string(::getpid()) + ".xml";
-    const std::string nowhere = testing::TempDir() + "hqf_no_such_folder/a.xml";
+    const support::folder place;
+    const std::string path = place / "a.xml", nowhere = place / "none" / "a.xml";
     model_class object;
     EXPECT_EQ(object.unmarshal(text), 0);
     std::string written;
     EXPECT_EQ(object.marshal(&written), 0);
     EXPECT_EQ(written, text);
     EXPECT_EQ(object.marshal(path.c_str()), 0);
-    EXPECT_EQ(in_file(path), text);
+    EXPECT_EQ(support::bytes_of(path), text);
     std::ostringstream stream;
     EXPECT_EQ(object.marshal(stream), 0);
     EXPECT_EQ(stream.str(), text);
@@ -72,7 +64,6 @@ void enter(const std::string& name, const std::string& text, int code_when_new) 
     EXPECT_EQ(out == "untouched", code_when_new != 0);
     EXPECT_EQ(fresh.marshal(path.c_str()), code_when_new);
     EXPECT_EQ(std::filesystem::exists(path), code_when_new == 0);
-    std::filesystem::remove(path);
 }
 
 const struct {

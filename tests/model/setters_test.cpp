@@ -43,7 +43,7 @@ struct row {
 };
 
 bool same(double a, double b) {
-    return a == b || (std::isnan(a) && std::isnan(b));
+    return (a == b && std::signbit(a) == std::signbit(b)) || (std::isnan(a) && std::isnan(b));
 }
 bool same(const std::wstring& a, const std::wstring& b) {
     return a == b;
