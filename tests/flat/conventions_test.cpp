@@ -2,14 +2,9 @@
 
 #include <algorithm>
 #include <climits>
-#include <filesystem>
-#include <fstream>
-#include <iterator>
 #include <new>
 #include <span>
 #include <stdexcept>
-
-#include <unistd.h>
 
 #include <gtest/gtest.h>
 
@@ -18,8 +13,11 @@
 #include "hqf/hqf.h"
 #include "hqf/zip/CZipException.h"
 #include "support.h"
+#include "tests/support/files.h"
+#include "tests/support/memory.h"
 
 using namespace flat_test;
+using support::wide;
 
 namespace {
 
@@ -27,11 +25,6 @@ namespace {
 template<class T>
 T& inside(void* object) {
     return *static_cast<T*>(object);
-}
-
-std::wstring wide(const std::string& utf8) {
-    std::wstring result;
-    return lmx::convert(&result, utf8);
 }
 
 const std::string archives = HQF_TEST_DATA "/archives/";
@@ -229,7 +222,8 @@ TEST(Documents, ForwardToTheirOperations) {
     EXPECT_EQ(CSharp_XMLDocumentResult_getElmxError(made), 12);
     EXPECT_EQ(taken(CSharp_XMLDocumentResult_getXmlDocument(made)), L"");
 
-    const std::string path = testing::TempDir() + "hqf_flat_" + std::to_string(::getpid());
+    const support::folder place;
+    const std::string path = place / "document";
     EXPECT_EQ(CSharp_Hqf_loadFile(document, wide(archives + "rendition-chart.hqfz").c_str()), 0);
     for (const char* suffix : {".hqfz", ".hqf"}) { // packing takes the plain file
         EXPECT_EQ(CSharp_Hqf_writeFile(document, wide(path + suffix).c_str()), 0) << suffix;
@@ -243,14 +237,11 @@ TEST(Documents, ForwardToTheirOperations) {
     auto by_path = MAKE(Hqf);
     EXPECT_EQ(CSharp_Hqf_unmarshal__SWIG_0(by_path, (path + ".hqf").c_str()), 0);
     EXPECT_EQ(CSharp_Hqf_marshal__SWIG_0(by_path, (path + ".copy").c_str()), 0);
-    std::ifstream file(path + ".copy", std::ios::binary);
-    const std::string bytes{std::istreambuf_iterator<char>(file), {}};
+    const std::string bytes = support::bytes_of(path + ".copy");
     auto from_memory = MAKE(Hqf);
     EXPECT_EQ(CSharp_Hqf_unmarshal__SWIG_1(from_memory, bytes.data(), static_cast<std::uint32_t>(bytes.size())), 0);
     EXPECT_EQ(hqf_Hqf_equal(by_path, from_memory), 1);
     EXPECT_NE(CSharp_Hqf_unmarshal__SWIG_1(from_memory, bytes.data(), 0), 0) << "the size counts";
-    for (const char* suffix : {".hqfz", ".hqf", ".copy"})
-        std::filesystem::remove(path + suffix);
 }
 
 TEST(Documents, DamagedGive1000AndAnExceptionItsText) {
@@ -293,15 +284,15 @@ TEST(Exceptions, EndAtTheExport) {
 }
 
 TEST(Exceptions, OfMemoryEndAtTheExport) {
-    if (!can_run_out_of_memory()) GTEST_SKIP() << "another allocator stands before ours";
+    if (!support::counts_memory()) GTEST_SKIP() << "another allocator stands before ours";
     listener ear;
     auto header = MAKE(Header);
     const std::wstring text(1000, L'x');
     CSharp_Header_set_Creator(header, L"before");
-    memory_is_out = true;
+    support::memory_is_out = true;
     EXPECT_EQ(CSharp_Header_set_Creator(header, text.c_str()), 42);
     EXPECT_EQ(ear.heard(), raised("std::bad_alloc"));
-    memory_is_out = true;
+    support::memory_is_out = true;
     EXPECT_EQ(CSharp_new_c_decimal__SWIG_0(), nullptr);
     EXPECT_EQ(ear.heard(), raised("std::bad_alloc"));
     EXPECT_EQ(taken(CSharp_Header_get_Creator(header)), L"before");

@@ -89,10 +89,6 @@ private:
 #define MAKE(cls) own<hqf_##cls>(CSharp_new_##cls##__SWIG_0(), CSharp_delete_##cls)
 #define MAKE_VALUE(cls, form, ...) own<lmx_##cls>(CSharp_new_##cls##__SWIG_##form(__VA_ARGS__), CSharp_delete_##cls)
 
-/// Makes the next allocation fail. Under Valgrind none does, as it has operators of its own.
-extern bool memory_is_out;
-bool can_run_out_of_memory();
-
 /// The text of a platform string, which is freed. A null one and one without its NUL say so.
 template<class unit>
 std::basic_string<unit> taken(unit* text) {
