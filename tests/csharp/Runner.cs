@@ -1,6 +1,6 @@
 // The tests of Hqf.dll: each prints a line for a check that failed, and the exit code tells whether any did.
 //
-// usage: mono csharp_test.exe SOURCE_FOLDER EXPORTS.txt
+// usage: mono csharp_test.exe EXPORTS.txt
 
 using System;
 using System.IO;
@@ -9,11 +9,10 @@ using HqfV2;
 static class Runner {
     static int checks, failures;
 
-    internal static string SourceFolder, ExportsPath;
+    internal static string ExportsPath;
 
     static int Main(string[] arguments) {
-        SourceFolder = arguments[0];
-        ExportsPath = arguments[1];
+        ExportsPath = arguments[0];
         foreach (Action test in new Action[] { ExportsTest.Run, TextTest.Run, MembersTest.Run, ClassesTest.Run,
                                                ListsTest.Run, ValuesTest.Run, LifetimeTest.Run, DocumentTest.Run }) {
             try {
