@@ -1,5 +1,4 @@
 // Whatever the bytes are, the road over the window and the general road give the same codes, items, lines and objects.
-// The general road is taken by a source that the library knows nothing of.
 
 #include <gtest/gtest.h>
 
@@ -9,42 +8,16 @@
 
 #include "hqf/hqf.h"
 #include "hqf/xml_in/c_read_memory.h"
-#include "hqf/xml_in/c_xml_reader.h"
 #include "tests/model/corpus.h"
 #include "tests/support/callers_source.h"
 #include "tests/support/documents.h"
 #include "tests/support/files.h"
 #include "tests/support/table.h"
+#include "tests/support/two_roads.h"
 
 namespace {
 
-/// Writes every report down, with what a handler can see of the reader, and goes on if asked to.
-class recording_reader : public lmx::c_xml_reader {
-public:
-    recording_reader(lmx::c_read& source, bool goes_on)
-        : c_xml_reader(source)
-        , goes_on_(goes_on) {}
-    lmx::elmx_error user_handle_error(lmx::elmx_error code, const std::string& item, const char*, int) override {
-        log += std::to_string(code) + ' ' + item + " line " + std::to_string(get_line_no()) + " depth " +
-               std::to_string(get_element_name_stack().get_stack_size()) + ' ' + item_name + '\n';
-        return goes_on_ ? lmx::err_no_error : code;
-    }
-    std::string log;
-
-private:
-    bool goes_on_;
-};
-
-struct outcome {
-    hqf_v2::Hqf document;
-    std::string log;
-};
-
-void load(lmx::c_read& source, bool goes_on, outcome& out) {
-    recording_reader reader(source, goes_on);
-    const lmx::elmx_error code = out.document.unmarshal(reader);
-    out.log = reader.log + "code " + std::to_string(code) + " line " + std::to_string(reader.get_line_no());
-}
+using support::load, support::outcome;
 
 void expect_same_on_both_roads(const std::string& text, const std::string& what,
                                std::initializer_list<bool> handlers = {false, true}) {
