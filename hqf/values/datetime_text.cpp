@@ -58,7 +58,8 @@ std::size_t character_size(const char* at, const char* end) {
     if (lead < 0x80) return lead >= 0x20 || lead == '\t' || lead == '\n' || lead == '\r' ? 1 : 0;
     char32_t c = 0;
     const std::size_t size = decode_sequence(at, end, c);
-    return (c >= 0xD800 && c <= 0xDFFF) || c == 0xFFFE || c == 0xFFFF || c > 0x10FFFF ? 0 : size;
+    const bool is_overlong = c < 0x80; // a line end in disguise is for the engine to judge
+    return is_overlong || (c >= 0xD800 && c <= 0xDFFF) || c == 0xFFFE || c == 0xFFFF || c > 0x10FFFF ? 0 : size;
 }
 
 char* put_padded(char* out, std::uint32_t value, int width) {
