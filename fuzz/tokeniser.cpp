@@ -8,6 +8,7 @@
 #include "fuzz/require.h"
 #include "hqf/xml_in/c_read_string.h"
 #include "hqf/xml_in/c_xml.h"
+#include "tests/support/callers_source.h"
 #include "tests/support/two_roads.h"
 
 namespace {
@@ -116,7 +117,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     const std::string choices = text.substr(split);
     text.resize(split);
     lmx::c_read_string memory(text);
-    support::one_byte_source bytes(text);
+    support::callers_source bytes(text);
     const bool has_nul = text.find('\0') != std::string::npos;
     const std::string fast = walk(memory, choices, has_nul).run();
     const std::string general = walk(bytes, choices, has_nul).run();

@@ -4,6 +4,7 @@
 
 #include "fuzz/require.h"
 #include "hqf/xml_in/c_read_string.h"
+#include "tests/support/callers_source.h"
 #include "tests/support/two_roads.h"
 
 namespace {
@@ -15,7 +16,7 @@ struct pair_of_documents {
 
     void load(const std::string& text, bool goes_on) {
         lmx::c_read_string memory(text);
-        support::one_byte_source bytes(text);
+        support::callers_source bytes(text);
         support::load(memory, goes_on, fast);
         support::load(bytes, goes_on, general);
         require(fast.log == general.log, "both roads report alike\n" + fast.log + "\n--\n" + general.log);

@@ -117,13 +117,13 @@ void dates(const std::string& text) {
     if (text.size() <= affordable && known != hqf::zone_pattern::ask_engine)
         require(pattern.is_match(text) == (known == hqf::zone_pattern::matched), "match_zone_pattern: " + text);
     lmx::c_datetime fast;
-    if (hqf::read_zoned_datetime(begin, end, fast)) {
-        require(lmx::c_datetime::is_valid(text), "read_zoned_datetime takes what is valid");
-        require(known == hqf::zone_pattern::matched, "read_zoned_datetime takes what matches");
+    if (hqf::scan_zoned_datetime(begin, end, fast) == end) {
+        require(lmx::c_datetime::is_valid(text), "scan_zoned_datetime takes what is valid");
+        require(known == hqf::zone_pattern::matched, "scan_zoned_datetime takes what matches");
         const lmx::c_datetime assigned(text);
         require(fast == assigned && fast.get_is_utc() == assigned.get_is_utc() &&
                     fast.get_total_offset_mins() == assigned.get_total_offset_mins(),
-                "read_zoned_datetime stores what assignment does");
+                "scan_zoned_datetime stores what assignment does");
     }
     valid_text_settles<lmx::c_datetime>(text, "c_datetime");
     valid_text_settles<lmx::c_date>(text, "c_date");
