@@ -39,19 +39,19 @@ struct block {
 constexpr std::size_t granule = 16;
 constexpr std::size_t largest_object = 4096;
 constexpr std::size_t sizes = (largest_object + sizeof(block*) + granule - 1) / granule + 1;
-/// A small document should cost little, a large one few blocks.
-constexpr std::size_t first_block_size = 1024, largest_block_size = 65536;
+/// A small document should cost little, a large one few blocks: a block is half of what there is before it, so that no
+/// more than a third lies idle behind the last object.
+constexpr std::size_t first_block_size = 1024, largest_block_size = 65536, share = 2;
 constexpr std::size_t least_slots = 4;
 
 constexpr std::size_t granules_of(std::size_t object_size) {
     return (object_size + sizeof(block*) + granule - 1) / granule;
 }
 
-/// Slots of one size: the blocks that have room.
+/// Slots of one size: the blocks that have room, and what all blocks take.
 struct pool {
     block* with_room = nullptr;
-    unsigned int blocks = 0;
-    unsigned int next_block_size = first_block_size;
+    std::size_t size = 0;
 };
 
 /// The pools of a thread. Never freed: a thread that ends leaves them, with what lives in them, to the next that
@@ -111,14 +111,15 @@ slot* take_from(block& room) {
 void add_block(thread_pools* owner, pool& to, std::size_t granules) {
     // Behind the head, objects lie on 16 bytes, so slots begin 8 bytes before.
     constexpr std::size_t head = (sizeof(block) + granule - 1) / granule * granule + granule - sizeof(block*);
-    const std::size_t slots = std::max(least_slots, (to.next_block_size - head) / (granules * granule));
-    char* const place = static_cast<char*>(::operator new(head + slots * granules * granule));
+    const std::size_t wanted = std::clamp(to.size / share, first_block_size, largest_block_size);
+    const std::size_t slots = std::max(least_slots, (wanted - head) / (granules * granule));
+    const std::size_t size = head + slots * granules * granule;
+    char* const place = static_cast<char*>(::operator new(size));
     append(to, *new (place) block{.owner = owner,
                                   .granules = static_cast<unsigned int>(granules),
                                   .unused = place + head,
-                                  .end = place + head + slots * granules * granule});
-    ++to.blocks;
-    to.next_block_size = std::min<unsigned int>(to.next_block_size * 2, largest_block_size);
+                                  .end = place + size});
+    to.size += size;
 }
 
 /// A slot where the first block with room has none.
@@ -139,10 +140,12 @@ void thread_pools::give_back(slot* freed) {
     home.free = freed;
     if (!home.has_room) append(to, home);
     if (--home.live != 0) return;
-    if (to.blocks == 1 && home.unused <= reinterpret_cast<char*>(&home) + 2 * first_block_size) return;
+    char* const place = reinterpret_cast<char*>(&home);
+    const auto size = static_cast<std::size_t>(home.end - place);
+    if (to.size == size && home.unused <= place + 2 * first_block_size) return;
+    to.size -= size;
     remove(to, home);
     ::operator delete(&home);
-    if (--to.blocks == 0) to.next_block_size = first_block_size;
 }
 
 void thread_pools::collect() {
