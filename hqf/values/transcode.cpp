@@ -147,31 +147,35 @@ std::size_t decode_sequence(const char* in, const char* end, char32_t& value) {
     return length;
 }
 
-const char* append_wide(std::wstring& out, const char* data, std::size_t size) {
+wchar_t* write_wide(wchar_t* out, const wchar_t* limit, const char*& next, const char* end) {
     constexpr std::ptrdiff_t careful_run = 8;
+    for (bool good = true; good && next != end && limit - out >= longest_pair;) {
+        widen_ascii_runs(next, end, out, limit);
+        const char* const stop = next + std::min(careful_run, end - next);
+        while (good && next < stop && limit - out >= longest_pair) {
+            const auto byte = static_cast<unsigned char>(*next);
+            if (byte < 0x80) {
+                *out++ = static_cast<wchar_t>(byte);
+                ++next;
+            } else {
+                good = decode_one(next, end, out);
+            }
+        }
+    }
+    return out;
+}
+
+const char* append_wide(std::wstring& out, const char* data, std::size_t size) {
     const char* const end = data + size;
     if (size > std::size_t{piece_size}) {
         const std::size_t run = ascii_run(data, size);
         make_room(out, run + wide_bound(data + run, size - run));
     }
-    for (bool good = true; good && data != end;) {
+    while (data != end) {
         wchar_t piece[piece_size];
-        const wchar_t* const limit = piece + piece_size - 1; // a character may give two
-        wchar_t* to = piece;
-        while (good && data != end && to < limit) {
-            widen_ascii_runs(data, end, to, limit);
-            const char* const stop = data + std::min(careful_run, end - data);
-            while (good && data < stop && to < limit) {
-                const auto byte = static_cast<unsigned char>(*data);
-                if (byte < 0x80) {
-                    *to++ = static_cast<wchar_t>(byte);
-                    ++data;
-                } else {
-                    good = decode_one(data, end, to);
-                }
-            }
-        }
-        out.append(piece, static_cast<std::size_t>(to - piece));
+        const wchar_t* const filled = write_wide(piece, piece + piece_size, data, end);
+        out.append(piece, static_cast<std::size_t>(filled - piece));
+        if (piece + piece_size - filled >= longest_pair) return data;
     }
     return data;
 }

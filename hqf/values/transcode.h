@@ -11,6 +11,13 @@ namespace hqf {
 /// The most bytes that are read as one character: the two halves of a surrogate pair, encoded each for itself.
 inline constexpr std::size_t longest_character = 6;
 
+/// The most wide elements that a character gives.
+inline constexpr std::ptrdiff_t longest_pair = 2;
+
+/// Writes the UTF-16 form of bytes of UTF-8 from `next` on, as long as there is room for any character before `limit`,
+/// and moves `next` over them, up to a character that is none or is cut off. Gives the end of what was written.
+wchar_t* write_wide(wchar_t* out, const wchar_t* limit, const char*& next, const char* end);
+
 /// Appends the UTF-16 form of `size` bytes of UTF-8, up to a character that is none or is cut off. Gives the place that
 /// it got to.
 const char* append_wide(std::wstring& out, const char* data, std::size_t size);

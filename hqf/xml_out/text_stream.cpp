@@ -30,15 +30,16 @@ void give_up_excess(text_type& text) {
     if (text.size() < text.capacity() / 2) text.shrink_to_fit();
 }
 
-/// Makes `text` a new string of up to `size` bytes that `fill` writes; it gets the memory and gives how many it wrote.
-template<class filler>
-void fill_new(std::string& text, std::size_t size, const filler& fill) {
+/// Makes `text` a new string of up to `size` elements that `fill` writes; it gets the memory and gives how many it
+/// wrote.
+template<class text_type, class filler>
+void fill_new(text_type& text, std::size_t size, const filler& fill) {
 #if defined(__cpp_lib_string_resize_and_overwrite)
     text.reserve(size);
-    expect_filling(text.data(), size);
+    expect_filling(text.data(), size * sizeof text[0]);
     // Nothing may be thrown through the string.
     std::exception_ptr thrown;
-    text.resize_and_overwrite(size, [&](char* memory, std::size_t) noexcept -> std::size_t {
+    text.resize_and_overwrite(size, [&](auto* memory, std::size_t) noexcept -> std::size_t {
         try {
             return fill(memory, size);
         } catch (...) {
@@ -48,15 +49,17 @@ void fill_new(std::string& text, std::size_t size, const filler& fill) {
     });
     if (thrown != nullptr) std::rethrow_exception(thrown);
 #else
-    // This library can't leave the bytes of a string to be written later, so all go to blocks.
+    // This standard library can't leave a string to be written later, so all goes another way.
     static_cast<void>(size);
     text.resize(fill(nullptr, 0));
 #endif
 }
 
-/// The bytes of UTF-8 that come block by block, as wide text.
+/// The bytes of UTF-8 that come block by block, as wide text: in memory first, then in a string.
 struct wide_target {
-    std::wstring text;
+    wchar_t* at = nullptr;
+    const wchar_t* limit = nullptr;
+    std::wstring rest;
     bool has_ended = false;
 
     /// A character that the block's end cuts in two is left for the next time.
@@ -64,7 +67,10 @@ struct wide_target {
         auto& own = *static_cast<wide_target*>(target);
         if (own.has_ended) return 0;
         const char* const end = bytes + size;
-        const auto left = static_cast<std::size_t>(end - append_wide(own.text, bytes, size));
+        own.at = write_wide(own.at, own.limit, bytes, end);
+        if (own.limit - own.at < longest_pair)
+            bytes = append_wide(own.rest, bytes, static_cast<std::size_t>(end - bytes));
+        const auto left = static_cast<std::size_t>(end - bytes);
         own.has_ended = left >= longest_character;
         return own.has_ended ? 0 : left;
     }
@@ -169,14 +175,21 @@ void gather(std::wstring& out, std::size_t expected, const stream_call& write) {
         if (is_wanted) assign_wide(out, utf8.data(), utf8.size());
         return;
     }
+    std::wstring text;
     wide_target wide;
-    wide.text.reserve(with_reserve(expected));
-    expect_filling(wide.text.data(), with_reserve(expected) * sizeof(wchar_t));
-    text_stream stream(wide_target::take, static_cast<void*>(&wide));
-    if (!write(stream)) return;
-    stream.buffer().finish();
-    give_up_excess(wide.text);
-    out.swap(wide.text);
+    bool is_wanted = false;
+    fill_new(text, with_reserve(expected), [&](wchar_t* memory, std::size_t size) {
+        wide.at = memory;
+        wide.limit = memory + size;
+        text_stream stream(wide_target::take, static_cast<void*>(&wide));
+        is_wanted = write(stream);
+        if (is_wanted) stream.buffer().finish();
+        return static_cast<std::size_t>(wide.at - memory);
+    });
+    if (!is_wanted) return;
+    text += wide.rest;
+    give_up_excess(text);
+    out.swap(text);
 }
 
 } // namespace hqf
