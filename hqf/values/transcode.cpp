@@ -96,14 +96,23 @@ void widen_ascii_runs(const char*& in, const char* end, wchar_t*& out, const wch
 #if defined(__SSE2__)
     static_assert(sizeof(wchar_t) == 4);
     const __m128i zero = _mm_setzero_si128();
-    const char* from = in;
-    wchar_t* to = out;
-    for (; end - from >= 8 && limit - to >= 8; from += 8, to += 8) {
+    const auto widen_eight = [zero](const char* from, wchar_t* to) {
         const __m128i bytes = _mm_loadl_epi64(reinterpret_cast<const __m128i*>(from));
-        if (_mm_movemask_epi8(bytes) != 0) break;
+        if (_mm_movemask_epi8(bytes) != 0) return false;
         const __m128i words = _mm_unpacklo_epi8(bytes, zero);
         _mm_storeu_si128(reinterpret_cast<__m128i*>(to), _mm_unpacklo_epi16(words, zero));
         _mm_storeu_si128(reinterpret_cast<__m128i*>(to + 4), _mm_unpackhi_epi16(words, zero));
+        return true;
+    };
+    const char* from = in;
+    wchar_t* to = out;
+    for (; end - from >= 8 && limit - to >= 8; from += 8, to += 8)
+        if (!widen_eight(from, to)) break;
+    // The last few once more with bytes before them, which are done.
+    const std::ptrdiff_t rest = end - from;
+    if (rest > 0 && rest < 8 && from != in && limit - to >= rest && widen_eight(end - 8, to - (8 - rest))) {
+        from = end;
+        to += rest;
     }
     in = from;
     out = to;
