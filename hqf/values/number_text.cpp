@@ -34,6 +34,10 @@ char* put_digits(char* out, std::uint64_t value) {
         return out + 1;
     }
     if (value < 100) return put_pair(out, value);
+    if (value < 1000) {
+        *out = static_cast<char>('0' + value / 100);
+        return put_pair(out + 1, value % 100);
+    }
     return std::to_chars(out, out + 20, value).ptr;
 }
 
@@ -85,8 +89,8 @@ char* put_with_decimals(char* out, double value) {
 /// that grid, so rounding the double to 14 digits gives it back. Which decimal that is, a division tells: both its
 /// operands are exact, so its result is the nearest double to their quotient.
 char* put_short_decimal(char* out, double value) {
-    constexpr double smallest = 1e-4; // the general format turns to exponents below this
-    if (value < smallest) return nullptr;
+    const auto whole = static_cast<std::int64_t>(value);
+    if (static_cast<double>(whole) == value) return put_digits(out, static_cast<std::uint64_t>(whole));
     char* end = put_with_decimals<4, 10000>(out, value);
     if (end == nullptr) end = put_with_decimals<6, 1000000>(out, value);
     if (end == nullptr) end = put_with_decimals<10, 10000000000>(out, value);
@@ -96,10 +100,16 @@ char* put_short_decimal(char* out, double value) {
 } // namespace
 
 char* write_number(char* out, double value) {
-    if (const char* const name = name_of(value)) return put(out, name);
-    const bool negative = value < 0;
-    if (negative) *out = '-';
-    if (char* const end = put_short_decimal(out + negative, negative ? -value : value)) return end;
+    // Below this the general format turns to exponents; above, few decimals are left in 14 digits.
+    constexpr double smallest = 1e-4, largest = 1e10;
+    const double magnitude = std::fabs(value);
+    if (magnitude >= smallest && magnitude < largest) {
+        const bool negative = value < 0;
+        if (negative) *out = '-';
+        if (char* const end = put_short_decimal(out + negative, magnitude)) return end;
+    } else if (const char* const name = name_of(value)) {
+        return put(out, name);
+    }
     return std::to_chars(out, out + number_text_size, value, std::chars_format::general, 14).ptr;
 }
 
