@@ -30,12 +30,17 @@ void give_up_excess(text_type& text) {
     if (text.size() < text.capacity() / 2) text.shrink_to_fit();
 }
 
-/// Makes `text` a new string of up to `size` elements that `fill` writes; it gets the memory and gives how many it
-/// wrote.
+/// Makes `text` a new string of up to `size` elements that `fill` writes; it gets the memory, or none where that much
+/// can't be had in one piece, and gives how many it wrote.
 template<class text_type, class filler>
 void fill_new(text_type& text, std::size_t size, const filler& fill) {
 #if defined(__cpp_lib_string_resize_and_overwrite)
-    text.reserve(size);
+    try {
+        text.reserve(size);
+    } catch (const std::exception&) {
+        fill(nullptr, 0);
+        return;
+    }
     expect_filling(text.data(), size * sizeof text[0]);
     // Nothing may be thrown through the string.
     std::exception_ptr thrown;

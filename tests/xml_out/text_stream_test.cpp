@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 
+#include <cstdint>
 #include <random>
 #include <stdexcept>
 
@@ -31,8 +32,8 @@ TEST(gather, whatever_was_expected) {
     bad = text;
     bad[900001 + bad.substr(900001).find('<')] = '\xFF';
     for (const std::string* each : {&text, &bad})
-        for (const std::size_t expected :
-             {std::size_t{0}, std::size_t{1}, std::size_t{100000}, text.size() - 70000, text.size(), 4 * text.size()}) {
+        for (const std::size_t expected : {std::size_t{0}, std::size_t{1}, std::size_t{100000}, text.size() - 70000,
+                                           text.size(), 4 * text.size(), SIZE_MAX / 4 * 3}) {
             const auto write = [&](std::ostream& stream) { return put_in_pieces(stream, *each); };
             std::string narrow = "before";
             hqf::gather(narrow, expected, write);
