@@ -94,6 +94,7 @@ private:
     bool fast_option();
     bool is_too_deep() const;
     bool enter(const parsed_start& start, const class_rows& rows, const element_name& name, void* object);
+    void remember_start(const element_name& name, const row* last_attribute, const row* body);
     void remember(const parsed_start& start, const class_rows& rows, const element_name& name);
     void remember_value(const row& r);
 

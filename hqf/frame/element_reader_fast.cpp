@@ -57,21 +57,27 @@ void element_reader::remember_value(const row& r) {
     reader_access::trace(reader_) = {name_kind::element, r.name, &r};
 }
 
-void element_reader::remember(const parsed_start& start, const class_rows& rows, const element_name& name) {
+/// Of a start tag, and of the value behind it if the element is read to its end: both may be null.
+inline void element_reader::remember_start(const element_name& name, const row* last_attribute, const row* body) {
     fast_trace& trace = reader_access::trace(reader_);
+    if (last_attribute == nullptr) {
+        trace.kind = name_kind::element;
+        trace.name = &name;
+    } else {
+        trace = {name_kind::attribute, last_attribute->attribute, last_attribute};
+    }
+    if (body != nullptr) trace.value = body;
+}
+
+void element_reader::remember(const parsed_start& start, const class_rows& rows, const element_name& name) {
     if (start.nil) {
+        fast_trace& trace = reader_access::trace(reader_);
         trace.kind = name_kind::nil;
         trace.value = &nil_row;
         return;
     }
-    if (start.count == 0) {
-        trace.kind = name_kind::element;
-        trace.name = &name;
-    } else {
-        const row& last = *start.attributes[start.count - 1];
-        trace = {name_kind::attribute, last.attribute, &last};
-    }
-    if (start.complete) trace.value = rows.rows;
+    remember_start(name, start.count == 0 ? nullptr : start.attributes[start.count - 1],
+                   start.complete ? rows.rows : nullptr);
 }
 
 // Tags
@@ -102,9 +108,7 @@ const char* element_reader::named_end_tag(window& in, const char* at) const {
 /// Goes into an element whose start tag has been read, or is done with it if that was all.
 bool element_reader::enter(const parsed_start& start, const class_rows& rows, const element_name& name, void* object) {
     if (start.is_plain()) {
-        fast_trace& trace = reader_access::trace(reader_);
-        trace.kind = name_kind::element;
-        trace.name = &name;
+        remember_start(name, nullptr, nullptr);
     } else {
         remember(start, rows, name);
         store_start(start, rows, object);
@@ -267,17 +271,8 @@ bool element_reader::fast_item(window& in, const char* at, const row& r) {
     void* const object = item.release();
     items.append(object);
     in.p = at;
-    fast_trace& trace = reader_access::trace(reader_);
-    if (start.last_attribute == nullptr) {
-        trace.kind = name_kind::element;
-        trace.name = r.name;
-    } else {
-        trace = {name_kind::attribute, start.last_attribute->attribute, start.last_attribute};
-    }
-    if (start.complete) {
-        trace.value = rows.rows;
-        return true;
-    }
+    remember_start(*r.name, start.last_attribute, start.complete ? rows.rows : nullptr);
+    if (start.complete) return true;
     error_ = element_reader(rows, object, reader_).entered(*r.name);
     return error_ == lmx::err_no_error;
 }
