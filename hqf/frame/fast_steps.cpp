@@ -1,6 +1,7 @@
 #include "hqf/frame/fast_steps.h"
 
 #include <bit>
+#include <iterator>
 #include <string_view>
 
 #include "hqf/frame/checks.h"
@@ -55,7 +56,37 @@ const char* take_text_with_references(window& in, const char* at, char stop, par
     return end;
 }
 
+/// Assigns a text of up to 64 characters, behind which 16 bytes can be read; false, with nothing done, if not all of
+/// them are ASCII. Most texts are names of a few words.
+bool assign_short(std::wstring& out, const char* text, std::size_t size) {
+#if defined(__SSE2__)
+    static_assert(sizeof(wchar_t) == 4);
+    wchar_t wide[64];
+    if (size > std::size(wide)) return false;
+    const __m128i zero = _mm_setzero_si128();
+    for (std::size_t done = 0; done < size; done += 16) {
+        const __m128i bytes = _mm_loadu_si128(reinterpret_cast<const __m128i*>(text + done));
+        const auto above = static_cast<unsigned int>(_mm_movemask_epi8(bytes));
+        if (above != 0 && done + static_cast<unsigned int>(std::countr_zero(above)) < size) return false;
+        auto* const to = reinterpret_cast<__m128i*>(wide + done);
+        const __m128i low = _mm_unpacklo_epi8(bytes, zero), high = _mm_unpackhi_epi8(bytes, zero);
+        _mm_storeu_si128(to, _mm_unpacklo_epi16(low, zero));
+        _mm_storeu_si128(to + 1, _mm_unpackhi_epi16(low, zero));
+        _mm_storeu_si128(to + 2, _mm_unpacklo_epi16(high, zero));
+        _mm_storeu_si128(to + 3, _mm_unpackhi_epi16(high, zero));
+    }
+    out.assign(wide, size);
+    return true;
+#else
+    static_cast<void>(out);
+    static_cast<void>(text);
+    static_cast<void>(size);
+    return false;
+#endif
+}
+
 void assign_text(std::wstring& out, const parsed_value& value) {
+    if (!value.has_references && assign_short(out, value.begin, value.size)) return;
     out.clear();
     const char* at = value.begin;
     while (value.has_references) {
