@@ -12,6 +12,8 @@ void measure(benchmark::State& state, const subject& document, write_operation w
     const std::string& text = document.text();
     hqf_v2::Hqf loaded;
     if (!load(state, loaded, text)) return;
+    for (int round = 0; round < warm_up_rounds; ++round)
+        static_cast<void>(write(loaded));
     for (auto _ : state) {
         const lmx::elmx_error error = write(loaded);
         if (error != lmx::err_no_error) {

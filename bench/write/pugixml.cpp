@@ -20,11 +20,15 @@ void save(benchmark::State& state, const subject& document, unsigned int format)
         state.SkipWithError("pugixml refuses the document");
         return;
     }
-    for (auto _ : state) {
+    const auto write = [&] {
         string_writer writer;
         tree.save(writer, "\t", format, pugi::encoding_utf8);
         benchmark::DoNotOptimize(writer.text.data());
-    }
+    };
+    for (int round = 0; round < warm_up_rounds; ++round)
+        write();
+    for (auto _ : state)
+        write();
     report(state, text.size(), checks::pugixml_write);
 }
 
