@@ -41,6 +41,14 @@ static class ValuesTest {
         };
         foreach (var row in rows)
             Equal(row.Why, row.Expected, row.Actual);
+        date.Year = -44;
+        date.Secs = 13.5f;
+        date.SetOffset(-1, 30);
+        Equal("fields that were set", "-0044-02-29T23:59:13.5-01:30", date.ToString());
+        duration.IsNeg = false;
+        duration.Mins = 66;
+        duration.Normalize();
+        Equal("and of a duration", "P1Y2M3DT5H6M6.5S", duration.ToString());
         binary.Append(7);
         Equal("one byte more", 5u, binary.GetSize());
 

@@ -112,32 +112,6 @@ TEST(load_file, any_name_but_an_archive_s_is_xml) {
     EXPECT_EQ(hqf_v2::Hqf().unmarshal((place / "a.hqfz").c_str()), 0);
 }
 
-TEST(load_string, codes_of_the_root) {
-    const std::string other_prefix =
-        replaced(smallest, "<Hqf:Hqf xmlns:Hqf", "<x:Hqf xmlns:x='http://hqf.example/v2' xmlns:Hqf");
-    const struct {
-        std::string text;
-        int code;
-        const char* why;
-    } rows[] = {
-        {smallest, 0, "as written"},
-        {std::string(smallest).substr(std::string(smallest).find("<Hqf:Hqf")), 0, "no declaration"},
-        {replaced(smallest, "<Hqf:Hqf ", "<Hqf:Hqf xsi:schemaLocation='a b' xsi:type='x' "), 0, "xsi attributes"},
-        {replaced(smallest, "<Hqf:Hqf ", "<Hqf:Hqf Comments='x' "), 39, "the root has no attributes"},
-        {replaced(smallest, "//hqf.example/v2", "//hqf.example/v3"), 16, "another namespace"},
-        {replaced(other_prefix, "</Hqf:Hqf>", "</x:Hqf>"), 0, "another prefix for the root"},
-        {other_prefix, 10, "an end tag spelled another way"},
-        {"<Hqf/>", 16, "no namespace"},
-        {"<Hqf:Hqf/>", 16, "nobody declares the prefix"},
-        {"<Hqf xmlns='http://hqf.example/v2'/>", 32, "an empty root"},
-        {"", 34, "nothing"},
-        {replaced(smallest, "T09:00:00Z", "T09:00:00"), 22, "no time zone"},
-        {replaced(smallest, "<Hqf:Preamble>", "<Hqf:Color/><Hqf:Preamble>"), 21, "Preamble isn't first"},
-    };
-    for (const auto& row : rows)
-        EXPECT_EQ(hqf_v2::Hqf().loadString(wide(row.text)), row.code) << row.why;
-}
-
 TEST(stamps, where_they_come_from_and_go) {
     using hqf_v2::Hqf;
     const auto read_name = [](const Hqf& document) {

@@ -168,37 +168,6 @@ TEST(accessors, groups) {
     EXPECT_FALSE(hqf::equal(function, second));
 }
 
-TEST(accessors, identities_and_factories) {
-    const ColorSpaceCIELab element;
-    EXPECT_EQ(element.getid(), ColorSpaceCIELabType::id);
-    EXPECT_TRUE(element.has_id(ColorSpaceCIELabType::id));
-    EXPECT_TRUE(element.has_id(ColorSpaceType::id));
-    const std::string same_text = "ColorSpaceCIELabType";
-    EXPECT_FALSE(element.has_id(same_text.c_str())) << "identities are pointers";
-    EXPECT_FALSE(element.has_id(SubstrateType::id));
-
-    const auto makes = []<class root>(root* (*factory)(int, const std::string&), int namespace_id, const char* name) {
-        return std::unique_ptr<root>(factory(namespace_id, name)) != nullptr;
-    };
-    const struct {
-        bool made;
-        bool expected;
-        const char* what;
-    } rows[] = {
-        {makes(ColorSpaceType::factory, 1000, "ColorSpaceMunsellType"), true, "a form"},
-        {makes(ColorSpaceType::factory, 1000, "ColorSpaceType"), false, "the root"},
-        {makes(ColorSpaceType::factory, 1001, "ColorSpaceMunsellType"), false, "another namespace"},
-        {makes(FunctionType::factory, 1000, "FunctionDEcmcType"), true, "a type with other letters than its element"},
-        {makes(FunctionType::factory, 1000, "FunctionType"), false, "the head"},
-        {makes(ColorSpaceSpecificationSpectrumType::factory, 1000, "ColorSpaceSpecificationSpectrumType"), true,
-         "a branch knows itself"},
-        {makes(ColorSpaceSpecificationSpectrumType::factory, 1000, "ColorSpaceSpecificationEmissiveType"), false,
-         "and not the other"},
-    };
-    for (const auto& row : rows)
-        EXPECT_EQ(row.made, row.expected) << row.what;
-}
-
 TEST(accessors, copies_count_as_set) {
     const Header empty;
     const Header copy(empty);

@@ -91,16 +91,6 @@ TEST(scan_double, random_texts_as_strtod) {
     }
 }
 
-TEST(scan_few_digits, takes_the_usual_measured_values) {
-    for (const std::string text :
-         {"0", "-0", "7", "100", "50.25", "-61.55", "46.8578", "0.6932", "1234567", "-0.00001"}) {
-        double value = 42;
-        const std::string padded = text + "<7777777";
-        EXPECT_EQ(hqf::scan_few_digits(padded.data(), value), padded.data() + text.size()) << text;
-        EXPECT_TRUE(same(value, std::atof(text.c_str()))) << text << " gave " << value;
-    }
-}
-
 TEST(scan_double, takes_the_longest_form) {
     for (const auto& [text, size, expected] : rows<3>(R"(
         1.5< 3 1.5   1e< 1 1   1e+< 1 1   1.e5x 4 1e5   -INFx 4 -inf   1.. 2 1   5e-3e 4 .005   -< -1 42   .< -1 42
