@@ -84,6 +84,13 @@ TEST(two_roads, sample_documents) {
             expect_same_on_both_roads(text, name);
 }
 
+/// Every cut of a small document.
+TEST(two_roads, cut_documents) {
+    const std::string text = support::document("syntax/plain.hqf");
+    for (std::size_t size = 0; size <= text.size(); ++size)
+        expect_same_on_both_roads(text.substr(0, size), "cut at " + std::to_string(size));
+}
+
 /// Files come in blocks of 256 KB. Blanks in front of the content move the edge of the first one over every byte of it.
 TEST(two_roads, block_edges_of_files) {
     constexpr std::size_t block = 256 * 1024;
