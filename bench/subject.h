@@ -35,7 +35,7 @@ constexpr char hqf_load[] = "all rules of the schema, typed objects";
 constexpr char expat_load[] = "well-formedness, namespaces";
 constexpr char pugixml_load[] = "most of well-formedness, tree";
 constexpr char hqf_write[] = "mandatory members and minimum counts";
-constexpr char pugixml_write[] = "nothing";
+constexpr char nothing[] = "nothing";
 } // namespace checks
 
 /// Throughput in bytes of document text, the text's size and what the peer checks.

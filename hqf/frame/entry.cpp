@@ -1,7 +1,6 @@
 #include "hqf/frame/entry.h"
 
 #include <cstdio>
-#include <fstream>
 
 #include "hqf/xml_in/reader_access.h"
 #include "hqf/xml_out/text_stream.h"
@@ -24,11 +23,10 @@ lmx::elmx_error gathered(text_type* out, void* object, const char* name, write_c
 } // namespace
 
 lmx::elmx_error write_file(const char* file_name, void* object, const char* name, write_call write) {
-    std::ofstream stream(file_name, std::ios::out | std::ios::trunc);
+    file_stream stream(file_name);
     if (!stream.is_open()) return lmx::err_unable_to_open_file;
     lmx::elmx_error error = write_stream(stream, object, name, write);
-    stream.close();
-    if (error == lmx::err_no_error && stream.fail()) error = lmx::err_undefined_error;
+    if (!stream.close() && error == lmx::err_no_error) error = lmx::err_undefined_error;
     if (error != lmx::err_no_error) std::remove(file_name);
     return error;
 }

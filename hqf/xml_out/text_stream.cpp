@@ -19,6 +19,9 @@ namespace {
 /// Blocks grow from one that a small document fills to one that a large document notes no more.
 constexpr std::size_t first_block = 64 * 1024, largest_block = 4 * 1024 * 1024;
 
+/// What the system keeps files in.
+constexpr std::size_t page = 4096;
+
 /// Documents change between a load and a write, and between two writes: a little more is needed, at times.
 constexpr std::size_t with_reserve(std::size_t expected) {
     return expected + expected / 64 + 4096;
@@ -68,7 +71,7 @@ struct wide_target {
     bool has_ended = false;
 
     /// A character that the block's end cuts in two is left for the next time.
-    static std::size_t take(void* target, const char* bytes, std::size_t size) {
+    static std::size_t take(void* target, const char* bytes, std::size_t size, bool) {
         auto& own = *static_cast<wide_target*>(target);
         if (own.has_ended) return 0;
         const char* const end = bytes + size;
@@ -101,7 +104,7 @@ void text_buffer::begin_block() {
 }
 
 void text_buffer::empty_block() {
-    const std::size_t left = take_(target_, pbase(), gathered());
+    const std::size_t left = take_(target_, pbase(), gathered(), false);
     std::memmove(pbase(), pptr() - left, left);
     setp(pbase(), epptr());
     advance_by(static_cast<std::ptrdiff_t>(left));
@@ -151,6 +154,32 @@ std::streamsize text_buffer::xsputn(const char* data, std::streamsize size) {
         left -= step;
     }
     return size;
+}
+
+file_stream::file_stream(const char* name)
+    : std::ostream(nullptr)
+    , file_(std::fopen(name, "w"))
+    , buffer_(take, static_cast<void*>(this)) {
+    rdbuf(&buffer_);
+    // Blocks come from the buffer above, so they needn't go through another.
+    if (is_open()) std::setvbuf(file_, nullptr, _IONBF, 0);
+}
+
+file_stream::~file_stream() {
+    if (is_open()) std::fclose(file_);
+}
+
+bool file_stream::close() {
+    buffer_.finish();
+    return std::fclose(std::exchange(file_, nullptr)) == 0 && took_all_ && good();
+}
+
+std::size_t file_stream::take(void* self, const char* text, std::size_t size, bool is_last) {
+    auto& own = *static_cast<file_stream*>(self);
+    const std::size_t left = is_last ? 0 : size % page;
+    // What comes after a hole would be no document.
+    if (own.took_all_) own.took_all_ = std::fwrite(text, 1, size - left, own.file_) == size - left;
+    return left;
 }
 
 void gather(std::string& out, std::size_t expected, const stream_call& write) {

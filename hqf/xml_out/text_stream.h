@@ -1,8 +1,9 @@
-/// A stream into memory of our own, for documents that become strings: a chain of blocks, so that nothing is copied
-/// while it grows, and the gathered output lies in it from the start.
+/// Streams into memory of our own, for documents that become strings or files: the gathered output lies in their blocks
+/// from the start, and nothing is copied while they grow.
 #pragma once
 
 #include <cstddef>
+#include <cstdio>
 #include <functional>
 #include <ostream>
 #include <streambuf>
@@ -13,8 +14,9 @@ namespace hqf {
 
 class text_buffer final : public std::streambuf {
 public:
-    /// Takes over what a full block holds, and gives how many bytes at its end it leaves for the next time.
-    using block_taker = std::size_t (*)(void* target, const char* text, std::size_t size);
+    /// Takes over what a full block holds, and gives how many bytes at its end it leaves for the next time. After the
+    /// last time there is no next.
+    using block_taker = std::size_t (*)(void* target, const char* text, std::size_t size, bool is_last);
 
     text_buffer() = default;
     /// Gathers in one block, which `take` empties whenever it is full.
@@ -34,7 +36,7 @@ public:
     /// \throws std::bad_alloc; `text` is as it was.
     void move_blocks_to(std::string& text);
     /// Hands the last text over to the taker.
-    void finish() { take_(target_, pbase(), gathered()); }
+    void finish() { take_(target_, pbase(), gathered(), true); }
 
     /// Where the next text may be written, with room for `size` bytes at least up to room_end(); at most 64 KB can be
     /// asked for.
@@ -83,6 +85,27 @@ public:
     text_buffer& buffer() { return buffer_; }
 
 private:
+    text_buffer buffer_;
+};
+
+/// A stream into a file that is made, or truncated, by this; for documents that the library writes by itself. Whole
+/// pages are given to the system: a page that comes in two parts costs it nearly twice as much.
+class file_stream final : public std::ostream {
+public:
+    explicit file_stream(const char* name);
+    file_stream(const file_stream&) = delete;
+    file_stream& operator=(const file_stream&) = delete;
+    ~file_stream() override;
+
+    bool is_open() const { return file_ != nullptr; }
+    /// Writes what is left and closes the file; false if the system didn't take all of the text.
+    bool close();
+
+private:
+    static std::size_t take(void* self, const char* text, std::size_t size, bool is_last);
+
+    std::FILE* file_;
+    bool took_all_ = true;
     text_buffer buffer_;
 };
 

@@ -8,6 +8,7 @@
 
 #include "hqf/values/text.h"
 #include "hqf/xml_out/text_stream.h"
+#include "tests/support/files.h"
 
 namespace {
 
@@ -44,6 +45,19 @@ TEST(gather, whatever_was_expected) {
             ASSERT_TRUE(wide == lmx::convert(&all, *each)) << expected;
             EXPECT_LE(wide.capacity(), 3 * text.size()) << expected;
         }
+}
+
+TEST(file_stream, sizes_around_pages_and_blocks) {
+    const support::folder folder;
+    const std::string name = (folder / "f").string();
+    std::string text;
+    while (text.size() < 200000)
+        text += std::to_string(text.size()) + ' ';
+    for (const std::size_t size : {0u, 1u, 4095u, 4096u, 4097u, 65535u, 65536u, 65537u, 131072u, 200000u}) {
+        hqf::file_stream stream(name.c_str());
+        ASSERT_TRUE(put_in_pieces(stream, text.substr(0, size)) && stream.close()) << size;
+        EXPECT_EQ(support::bytes_of(name), text.substr(0, size)) << size;
+    }
 }
 
 TEST(gather, leaves_the_string_alone_without_success) {
