@@ -91,7 +91,7 @@ char* copy_ascii_runs(char* out, const char* limit, const wchar_t*& next, const 
 /// grows run by run is moved again and again.
 constexpr std::ptrdiff_t piece_size = 1024;
 
-/// Copies ASCII, eight bytes at a time as long as all of them are and there is room.
+/// Copies ASCII, 32 bytes at a time and then eight, as long as all of them are and there is room.
 void widen_ascii_runs(const char*& in, const char* end, wchar_t*& out, const wchar_t* limit) {
 #if defined(__SSE2__)
     static_assert(sizeof(wchar_t) == 4);
@@ -104,9 +104,25 @@ void widen_ascii_runs(const char*& in, const char* end, wchar_t*& out, const wch
         _mm_storeu_si128(reinterpret_cast<__m128i*>(to + 4), _mm_unpackhi_epi16(words, zero));
         return true;
     };
+    const auto widen_sixteen = [zero](__m128i bytes, wchar_t* to) {
+        const auto store = [to](int i, __m128i four) { _mm_storeu_si128(reinterpret_cast<__m128i*>(to + i), four); };
+        const __m128i low = _mm_unpacklo_epi8(bytes, zero), high = _mm_unpackhi_epi8(bytes, zero);
+        store(0, _mm_unpacklo_epi16(low, zero));
+        store(4, _mm_unpackhi_epi16(low, zero));
+        store(8, _mm_unpacklo_epi16(high, zero));
+        store(12, _mm_unpackhi_epi16(high, zero));
+    };
     const char* from = in;
     wchar_t* to = out;
-    for (; end - from >= 8 && limit - to >= 8; from += 8, to += 8)
+    const char* const last = from + std::min(end - from, limit - to);
+    for (; last - from >= 32; from += 32, to += 32) {
+        const __m128i first = _mm_loadu_si128(reinterpret_cast<const __m128i*>(from));
+        const __m128i second = _mm_loadu_si128(reinterpret_cast<const __m128i*>(from + 16));
+        if (_mm_movemask_epi8(_mm_or_si128(first, second)) != 0) break;
+        widen_sixteen(first, to);
+        widen_sixteen(second, to + 16);
+    }
+    for (; last - from >= 8; from += 8, to += 8)
         if (!widen_eight(from, to)) break;
     // The last few once more with bytes before them, which are done.
     const std::ptrdiff_t rest = end - from;
