@@ -71,7 +71,7 @@ bool CZipArchive::OpenFile(unsigned int index) {
     central_dir_.OpenFile(index);
     CZipFileHeader& header = *central_dir_.GetOpenHeader();
     try {
-        if (CreateCompressor(header.GetMethod()) == nullptr) {
+        if (CreateCompressor(header.GetMethod()) == nullptr || compressor_ == nullptr) {
             central_dir_.CloseFile(true);
             return false;
         }

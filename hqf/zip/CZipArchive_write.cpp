@@ -50,7 +50,7 @@ bool CZipArchive::OpenNewFile(const CZipFileHeader& header, int level, const std
         entry.SetFileName(name + L'\\');
     if (level < -1 || level > 9) level = -1;
     entry.method_ = level == 0 || is_directory ? std::uint16_t{0} : compression_method_;
-    if (entry.method_ == bzip2 || CreateCompressor(entry.method_) == nullptr) return false;
+    if (entry.method_ == bzip2 || CreateCompressor(entry.method_) == nullptr || compressor_ == nullptr) return false;
     CZipFileHeader* const added = central_dir_.AddNewFile(entry, replaceIndex, level);
     state_ = open_entry::writing;
     try {

@@ -197,11 +197,12 @@ void CZipCentralDir::WriteCentralEnd() {
 
 bool CZipCentralDir::is_size_credible(unsigned int index) const {
     const CZipFileHeader& header = *headers_[index];
+    // Only packed bytes that there is room for before the directory say anything.
     const std::uint64_t data_begin = std::uint64_t{header.local_offset_} + 30;
-    const std::uint64_t data_end = data_begin + header.compressed_size_;
-    if (end_.is_in_file && data_end > end_.offset) return false;
+    std::uint64_t packed = header.compressed_size_;
+    if (end_.is_in_file) packed = std::min(packed, end_.offset - std::min<std::uint64_t>(end_.offset, data_begin));
     const std::uint64_t expansion = header.method_ == 8    ? limits::deflate_expansion
                                     : header.method_ == 12 ? limits::bzip2_expansion
                                                            : 1;
-    return header.uncompressed_size_ <= header.compressed_size_ * expansion;
+    return header.uncompressed_size_ <= packed * expansion;
 }

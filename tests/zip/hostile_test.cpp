@@ -76,7 +76,7 @@ TEST(zip_hostile, both_headers_lie_alike) {
         {lie(8, [](entry& e) { e.size = e.packed_size * 1032 + 1; }), refused, "deflate: one more than that"},
         {lie(8, [](entry& e) { e.packed_size -= 1; }), any_failure, "deflate: packed data cut"},
         {lie(8, [](entry& e) { e.packed_size += 1, e.data += "x"; }), 0, "deflate: more than the stream takes"},
-        {lie(8, [](entry& e) { e.packed_size += 6; }), refused, "deflate: packed data reach into the directory"},
+        {lie(8, [](entry& e) { e.packed_size += 6; }), 0, "deflate: packed data reach into the directory"},
         {lie(8, [](entry& e) { e.size = e.packed_size = 0, e.data = ""; }), 101, "deflate: no stream at all"},
         {lie(0, [](entry& e) { e.size += 1; }), refused, "stored: one byte more"},
         {lie(0, [](entry& e) { e.crc = crc_of(content.substr(0, --e.size)); }), 101, "stored: less, and it agrees"},
