@@ -1,11 +1,13 @@
 /// Everything that a user of the class interface needs: the model classes and the runtime under them.
 #pragma once
 
+#include "hqf/document/SdkInformationStamper.h"
 #include "hqf/document/XMLDocumentResult.h"
 #include "hqf/errors/c_error.h"
 #include "hqf/errors/c_lmx_exception.h"
 #include "hqf/errors/elmx_error.h"
 #include "hqf/model/classes.h"
+#include "hqf/platform/build_constants.h"
 #include "hqf/values/c_as_xml.h"
 #include "hqf/values/c_big_int.h"
 #include "hqf/values/c_binary.h"
@@ -18,6 +20,7 @@
 #include "hqf/values/ct_qname.h"
 #include "hqf/values/lexical.h"
 #include "hqf/values/text.h"
+#include "hqf/xml_in/c_entity_name_reader.h"
 #include "hqf/xml_in/c_known_elements_selector.h"
 #include "hqf/xml_in/c_read_file.h"
 #include "hqf/xml_in/c_read_memory.h"

@@ -17,7 +17,7 @@ constexpr error_row error_rows[] = {
 
 } // namespace
 
-const char* get_error_description(elmx_error code) {
+const char* get_error_description(int code) {
     for (const error_row& row : error_rows)
         if (row.code == code) return row.sentence;
     return "";

@@ -87,8 +87,8 @@ enum elmx_error_type : int {
     error_none = 4,    ///< nothing has been recorded
 };
 
-/// The sentence that belongs to a code: "No Error" for 0, the empty text for a code without one. Never null; the text
-/// stays valid for the life of the library.
-HQF_API const char* get_error_description(elmx_error code);
+/// The sentence that belongs to a code: "No Error" for 0, the empty text for a number that is no code. Never null; the
+/// text stays valid for the life of the library.
+HQF_API const char* get_error_description(int code);
 
 } // namespace lmx

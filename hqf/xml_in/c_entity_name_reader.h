@@ -17,7 +17,7 @@ class HQF_API c_entity_name_reader {
 public:
     /// \param is_stream_value whether the entity's value is to be pushed on the character stream, markup and all;
     /// otherwise it is expanded in place
-    explicit c_entity_name_reader(bool is_stream_value)
+    explicit c_entity_name_reader(bool is_stream_value = false)
         : is_stream(is_stream_value) {}
     c_entity_name_reader(const c_entity_name_reader&) = delete;
     c_entity_name_reader& operator=(const c_entity_name_reader&) = delete;
@@ -28,7 +28,7 @@ public:
     /// Gives a byte back.
     virtual void unget(int c) = 0;
 
-    const bool is_stream;
+    bool is_stream;
 };
 
 /// Reads from the character stream.

@@ -72,10 +72,6 @@ bool c_get_with_entities::set_input_entity_value(const char* value) {
         error(error_fatal, err_badly_formed_dtd, std::string("Recursive entity definition for: ") + value);
         return false;
     }
-    if (frames_.size() >= hqf::limits::entity_depth) {
-        error(error_fatal, err_badly_formed_dtd, "Entities nested too deeply");
-        return false;
-    }
     if (!pay_for_expansion(value)) {
         error(error_fatal, err_badly_formed_dtd, "Entities expand to too much text");
         return false;

@@ -15,15 +15,15 @@ namespace lmx {
 class HQF_API c_read_memory : public c_read {
 public:
     c_read_memory(const char* data, unsigned int size)
-        : c_read_memory(data, data + size) {}
+        : c_read_memory(hqf::byte_run{data, data + size}) {}
 
     int read() override { return run_.empty() ? -1 : run_.take(); }
     void rewind() override;
 
 protected:
-    c_read_memory(const char* begin, const char* end)
-        : start_(begin)
-        , run_{begin, end} {}
+    explicit c_read_memory(hqf::byte_run bytes)
+        : start_(bytes.cursor)
+        , run_(bytes) {}
 
 private:
     friend class c_get_as_utf8;

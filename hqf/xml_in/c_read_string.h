@@ -10,7 +10,7 @@ namespace lmx {
 class HQF_API c_read_string : public c_read_memory {
 public:
     explicit c_read_string(const std::string& text)
-        : c_read_memory(text.data(), text.data() + text.size()) {}
+        : c_read_memory(hqf::byte_run{text.data(), text.data() + text.size()}) {}
 };
 
 } // namespace lmx

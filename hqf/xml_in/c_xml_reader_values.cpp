@@ -14,6 +14,8 @@ bool fail(elmx_error* error, elmx_error code) {
 
 bool c_xml_reader::get_simple_type_value(const std::string& name, elmx_whitespace mode, std::string* out,
                                          elmx_error* error, bool* empty) {
+    bool unwanted = false;
+    if (empty == nullptr) empty = &unwanted;
     out->clear();
     if (!move_to_start_tag_end(empty)) return fail(error, err_bad_start_tag_end);
     if (*empty) return true;
@@ -22,6 +24,8 @@ bool c_xml_reader::get_simple_type_value(const std::string& name, elmx_whitespac
 }
 
 bool c_xml_reader::get_element_ur_value(const std::string& name, std::string* out, elmx_error* error, bool* empty) {
+    bool unwanted = false;
+    if (empty == nullptr) empty = &unwanted;
     out->clear();
     if (!move_to_start_tag_end(empty)) return fail(error, err_bad_start_tag_end);
     if (*empty) return true;

@@ -22,6 +22,10 @@ int c_get_as_utf8::decode_next() {
 }
 
 int c_get_as_utf8::deliver_sequence() {
+    if (*sequence_cursor_ == 0) {
+        sequence_cursor_ = nullptr;
+        return -1;
+    }
     const int c = static_cast<unsigned char>(*sequence_cursor_++);
     if (*sequence_cursor_ == 0) sequence_cursor_ = nullptr;
     return c;
@@ -113,6 +117,7 @@ int c_get_as_utf8::detect_behind_mark(encoding_state state) {
     state_ = state;
     const int unit = read_unit(next_byte());
     if (unit >= 1 && unit <= 127) return unit;
+    state_ = undecided;
     return refuse_encoding();
 }
 
@@ -132,13 +137,13 @@ int c_get_as_utf8::detect_without_mark(int first) {
     }
     state_ = utf8;
     if (second == -1) return first;
-    // The second byte has been read, so its character waits behind the first one; where there is none, the end does.
+    // The second byte has been read, so its character waits behind the first one; where there is none, the end does, as
+    // a sequence without bytes.
     if (second < 128) {
         sequence_[0] = static_cast<char>(second);
         sequence_[1] = 0;
     } else if (!read_sequence(second)) {
-        ungot_.unget(-1);
-        return first;
+        sequence_[0] = 0;
     }
     sequence_cursor_ = sequence_;
     return first;

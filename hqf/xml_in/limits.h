@@ -26,10 +26,10 @@ inline constexpr unsigned skip_depth = 1000;
 /// capture fails: code 29.
 inline constexpr unsigned capture_depth = 1000;
 
-/// Most entities that may be open inside one another.
+/// Most entities that may be open inside one another in an attribute value.
 ///
-/// In attribute values each is a call on the stack; in text each new one is compared with all that are open. In text
-/// the answer is a fatal report with code 9, in an attribute value the reference fails: code 28.
+/// There each is a call on the stack, and a deeper reference fails: code 28. In text they lie on the heap, as many as
+/// the limits below let in.
 inline constexpr std::size_t entity_depth = 1000;
 
 /// Bytes that entities may add to a document before their growth is held against its size.

@@ -29,10 +29,8 @@ namespace lmx {
 class HQF_API c_xml_writer {
 public:
     /// Flags of the second constructor; either one brings the XML declaration.
-    enum : int {
-        include_xml_decl = 1,   ///< the XML declaration, version 1.0 and UTF-8
-        include_standalone = 2, ///< the declaration with `standalone="yes"`
-    };
+    static constexpr int include_xml_decl = 1;   ///< the XML declaration, version 1.0 and UTF-8
+    static constexpr int include_standalone = 2; ///< the declaration with `standalone="yes"`
 
     /// Gives the stream the classic locale, so that numbers never carry grouping or a decimal comma. Writes nothing.
     ///

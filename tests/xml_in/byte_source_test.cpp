@@ -180,7 +180,14 @@ std::string decoded(lmx::c_read& source) {
 TEST(decoding, finds_the_encoding_and_ends_at_what_is_no_character) {
     given{decoded}.from_every_source(cases("decoded"));
     reading<lmx::c_get_as_utf8> r("<\x80z"s);
-    EXPECT_EQ(next(r.in, 3), "<\xFFz") << "what is no UTF-8 reads as the end, right behind the first character too";
+    EXPECT_EQ(next(r.in, 1), "<");
+    for (const char c : {'3', '2', '1'})
+        r.in.unget(c);
+    EXPECT_EQ(next(r.in, 5), "123\xFFz") << "what is no UTF-8 reads as the end, right behind the first character too";
+    reading<lmx::c_get_as_utf8> refused("\xFF\xFE\xE9\0"s);
+    EXPECT_EQ(next(refused.in, 1), "\xFF");
+    EXPECT_FALSE(refused.in.set_encoding("UTF-16")) << "the mark alone decides nothing";
+    EXPECT_EQ(lmx::c_read_memory("", 0).read(), -1);
 }
 
 TEST(decoding, utf16_joins_surrogates) {

@@ -61,9 +61,8 @@ TEST(hostile, entities_that_hold_or_define_themselves) {
 TEST(hostile, entities_nested_deeply) {
     for (const unsigned int length : {900u, 20000u}) {
         const std::string subset = expanded("<!DOCTYPE a [<!ENTITY e$ 'v'>{<!ENTITY e@ '&e^;'>}", length);
-        const bool passes = length == 900;
-        EXPECT_EQ(run(content, subset + "]><a>&e0;</a>"), passes ? "(v)</a>" : "! {0 9 Entities nested too deeply}");
-        EXPECT_EQ(run(attribute, subset + "]><a b='&e0;'/>"), passes ? "(v)" : "!");
+        EXPECT_EQ(run(content, subset + "]><a>&e0;</a>"), "(v)</a>");
+        EXPECT_EQ(run(attribute, subset + "]><a b='&e0;'/>"), length == 900 ? "(v)" : "!");
     }
 }
 

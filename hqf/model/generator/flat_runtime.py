@@ -7,15 +7,12 @@ Numbers behind __SWIG_ are those of the C++ forms; a form without an export leav
 from __future__ import annotations
 
 import re
+from pathlib import Path
 
 from flat_model import Argument, Export, Result
 
-CONSTANTS = {
-    "LMXNULL": 0, "LMX_XML_STRICT": 1, "LMX_VALIDATE_PATTERNS": 1, "LMX_WANT_DECIMAL_FLOAT_SET": 1,
-    "LMX_USE_EXCEPTIONS": 0, "LMX_NARROW_UNICODE_STRINGS": 0, "LMX_WANT_DLL": 0, "LMX_WANT_GEN_IMPORT_DLL": 0,
-    "LMX_ATOFLOAT_MODE": 0, "LMX_ATOFLOAT_MODE_DEFAULT": 0, "LMX_ATOFLOAT_MODE_USE_FACET": 1,
-    "LMX_ATOFLOAT_MODE_IOSTREAM": 2, "LMX_ATOFLOAT_MODE_SIMPLE": 3,
-}
+CONSTANTS_HEADER = Path(__file__).parents[2] / "platform" / "build_constants.h"
+CONSTANTS = {name: int(value) for name, value in re.findall(r"#define (\w+) (\d+)", CONSTANTS_HEADER.read_text())}
 
 FUNCTIONS = """
     raw_text get_error_description(code code)        // The sentence of a code; the library keeps it.
