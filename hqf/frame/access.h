@@ -5,6 +5,7 @@
 #include <atomic>
 #include <memory>
 #include <string>
+#include <utility>
 
 #include "hqf/frame/checks.h"
 #include "hqf/frame/objects.h"
@@ -29,6 +30,13 @@ template<class object_type>
 object_type& object_or_spare(object_type* object) {
     static thread_local object_type spare;
     return object != nullptr ? *object : spare;
+}
+
+/// Gives `object` what a copy holds that was made before it: what is chosen now may have held the source.
+template<class object_type>
+object_type& swapped(object_type& object, object_type& copy) {
+    object.swap(copy);
+    return object;
 }
 
 /// Makes an object nil: an operation of the classes that can be.
@@ -80,10 +88,10 @@ option_value(const choice_slot& slot, int index) {
         return object_or_empty(slot.chosen == index ? static_cast<const value_type*>(slot.object) : nullptr);
 }
 
-/// Chooses an option, then checks the value against its rules, then stores it.
+/// Chooses an option, then checks the value against its rules, then stores it. The value comes as a copy: it may lie in
+/// the option that is given up.
 template<class value_type>
-lmx::elmx_error store_option(const class_rows& rows, void* object, choice_slot& slot, int index,
-                             const value_type& value) {
+lmx::elmx_error store_option(const class_rows& rows, void* object, choice_slot& slot, int index, value_type value) {
     choose_option(rows, object, index);
     const lmx::elmx_error error = check_value(value, rows.rows[index].rules);
     if (error != lmx::err_no_error) return error;
@@ -94,7 +102,7 @@ lmx::elmx_error store_option(const class_rows& rows, void* object, choice_slot& 
     else if constexpr (std::is_same_v<value_type, unsigned int>)
         slot.natural = value;
     else
-        *static_cast<value_type*>(slot.object) = value;
+        *static_cast<value_type*>(slot.object) = std::move(value);
     return lmx::err_no_error;
 }
 

@@ -397,7 +397,7 @@ bool element_reader::choice() {
 bool element_reader::read_option(const row& option) {
     in_hand_ = false;
     last_row_ = 0;
-    choose_option(rows_, object_, static_cast<int>(&option - rows_.rows));
+    choose_new_option(rows_, object_, static_cast<int>(&option - rows_.rows));
     auto& slot = member_at<choice_slot>(object_, rows_.slot);
     if (option.what == kind::child) return read_object(*option.type, slot.object);
     bool stored = false;
@@ -442,7 +442,10 @@ bool read_member(const class_rows& group, void* object, lmx::c_xml_reader& reade
         *error = reader.handle_error(code, name, source_name, line);
         return *error == lmx::err_no_error;
     };
-    const bool has_name = reader.is_current_event_tokenisable();
+    // An element whose name is one of the xsi attributes' is an element all the same.
+    const int event = reader.get_current_event();
+    const bool has_name = reader.is_current_event_tokenisable() ||
+                          (event >= lmx::EXE_XSI_TYPE && event <= lmx::EXE_XSI_NO_NS_SCHEMA_LOCATION);
     if (has_name) reader.tokenise(group.element_events, lmx::elxp_element);
     int index = has_name ? group.member_count - 1 : -1;
     while (index >= 0 && group.members[index].name->event != reader.get_current_event())

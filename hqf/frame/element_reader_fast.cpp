@@ -346,11 +346,10 @@ bool element_reader::fast_option() {
     const row& option = rows_.rows[index];
     auto& slot = member_at<choice_slot>(object_, rows_.slot);
     if (option.what == kind::child) {
-        const void* const object = slot.chosen == index ? slot.object : nullptr;
         parsed_start start;
-        const char* const at = parse_start(*in, tag, *option.type, *option.name, object, start);
+        const char* const at = parse_start(*in, tag, *option.type, *option.name, nullptr, start);
         if (at == nullptr || (!start.complete && is_too_deep())) return false;
-        choose_option(rows_, object_, index);
+        choose_new_option(rows_, object_, index);
         in->p = at;
         if (!enter(start, *option.type, *option.name, slot.object)) return false;
     } else {
@@ -359,7 +358,7 @@ bool element_reader::fast_option() {
         if (at[-1] != '>') return false;
         at = parse_content(*in, at, option.what, option.rules, *option.name, value);
         if (at == nullptr) return false;
-        choose_option(rows_, object_, index);
+        choose_new_option(rows_, object_, index);
         in->p = at;
         store_value(value, option.what, option.rules, option.what == kind::text ? slot.object : &slot.real);
         remember_value(option);

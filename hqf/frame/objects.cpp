@@ -289,8 +289,11 @@ void release_choice(const class_rows& rows, void* object) {
 }
 
 void choose_option(const class_rows& rows, void* object, int index) {
+    if (choice_of(rows, object).chosen != index) choose_new_option(rows, object, index);
+}
+
+void choose_new_option(const class_rows& rows, void* object, int index) {
     choice_slot& slot = choice_of(rows, object);
-    if (slot.chosen == index) return;
     release_choice(rows, object);
     const row& option = rows.rows[index];
     if (option.what == kind::text)

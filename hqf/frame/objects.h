@@ -24,5 +24,7 @@ void release_choice(const class_rows& rows, void* object);
 
 /// Makes option `index` of a choice the chosen one, with empty storage. Keeps what it holds if it is chosen already.
 void choose_option(const class_rows& rows, void* object, int index);
+/// The same, but always with empty storage: what is read is new.
+void choose_new_option(const class_rows& rows, void* object, int index);
 
 } // namespace hqf::frame

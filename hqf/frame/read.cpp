@@ -4,6 +4,29 @@
 
 namespace hqf::frame {
 
+namespace {
+
+/// Derived classes may follow the item's name in a string of their own; all else looks at the reader's.
+class item_name_of_caller {
+public:
+    item_name_of_caller(lmx::c_xml_reader& reader, std::string* name)
+        : reader_(reader)
+        , name_(name == &reader.item_name ? nullptr : name) {
+        if (name_ != nullptr) reader_.item_name = *name_;
+    }
+    item_name_of_caller(const item_name_of_caller&) = delete;
+    item_name_of_caller& operator=(const item_name_of_caller&) = delete;
+    ~item_name_of_caller() {
+        if (name_ != nullptr) name_->swap(reader_.item_name);
+    }
+
+private:
+    lmx::c_xml_reader& reader_;
+    std::string* const name_;
+};
+
+} // namespace
+
 lmx::elmx_error read_element(const class_rows& rows, void* object, lmx::c_xml_reader& reader, const std::string& name) {
     return element_reader(rows, object, reader).element(name);
 }
@@ -22,15 +45,18 @@ lmx::elmx_error check_attributes(const class_rows& rows, void* object, lmx::c_xm
     return element.error();
 }
 
-bool read_body(const class_rows& rows, void* object, lmx::c_xml_reader& reader, lmx::elmx_error* error) {
+bool read_body(const class_rows& rows, void* object, lmx::c_xml_reader& reader, std::string* name,
+               lmx::elmx_error* error) {
+    const item_name_of_caller own(reader, name);
     element_reader element(rows, object, reader);
     const bool done = element.body_from_event();
     *error = element.error();
     return done;
 }
 
-bool read_simple_body(const class_rows& rows, void* object, lmx::c_xml_reader& reader, lmx::elmx_error* error,
-                      bool has_body) {
+bool read_simple_body(const class_rows& rows, void* object, lmx::c_xml_reader& reader, std::string* name,
+                      lmx::elmx_error* error, bool has_body) {
+    const item_name_of_caller own(reader, name);
     element_reader element(rows, object, reader);
     const bool done = element.simple_body(has_body);
     *error = element.error();
@@ -41,7 +67,7 @@ bool is_member(const class_rows& rows, lmx::c_xml_reader& reader) {
     if (!reader.is_current_event_tokenisable()) return false;
     const int old_event = reader.get_current_event();
     reader.tokenise(rows.element_events, lmx::elxp_element);
-    if (reader.get_current_event() != lmx::EXE_OTHER) return true;
+    if (reader.get_current_event() >= lmx::EXE_FIRST_TOKEN) return true;
     reader.restore_event(old_event);
     return false;
 }

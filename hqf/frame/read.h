@@ -22,13 +22,13 @@ bool read_attribute(const class_rows& rows, void* object, lmx::c_xml_reader& rea
 lmx::elmx_error check_attributes(const class_rows& rows, void* object, lmx::c_xml_reader& reader);
 
 /// Reads the children, from the reader's current event to the first one that the class doesn't take. False with a code
-/// in
-/// `*error` when that failed.
-bool read_body(const class_rows& rows, void* object, lmx::c_xml_reader& reader, lmx::elmx_error* error);
+/// in `*error` when that failed. `*name` is the current element's name, before and after; null for the reader's own.
+bool read_body(const class_rows& rows, void* object, lmx::c_xml_reader& reader, std::string* name,
+               lmx::elmx_error* error);
 
 /// Reads the value of a class with simple content; without a body it is the empty text.
-bool read_simple_body(const class_rows& rows, void* object, lmx::c_xml_reader& reader, lmx::elmx_error* error,
-                      bool has_body);
+bool read_simple_body(const class_rows& rows, void* object, lmx::c_xml_reader& reader, std::string* name,
+                      lmx::elmx_error* error, bool has_body);
 
 /// Whether the current element is a member of the group; if so, its event stays, otherwise the old one is put back.
 bool is_member(const class_rows& rows, lmx::c_xml_reader& reader);

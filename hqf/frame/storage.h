@@ -142,7 +142,7 @@ struct group_slot : object_slot {
         root_class* old = get();
         object = made;
         chosen = index;
-        delete old;
+        if (old != made) delete old;
     }
 };
 

@@ -192,7 +192,9 @@ char* element_writer::child(char* at, const row& r, void* object) {
         if (held.object != nullptr)
             return r.what == kind::group_pointer ? group(at, *r.type, held.object)
                                                  : element(at, *r.type, held.object, tag(*r.name));
-        if (!held.nil) return failed(at, lmx::err_type_not_set);
+        if (!held.nil)
+            return failed(at, r.what == kind::group_pointer ? lmx::err_type_not_set
+                                                            : lmx::err_min_max_occurs_error_on_marshaling);
         return nil_end(start(at, *r.type, tag(*r.name)));
     }
     default: return end_tag(stored_value(start_tag(at, tag(*r.name)), r, object), tag(*r.name));

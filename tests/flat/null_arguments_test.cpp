@@ -38,7 +38,7 @@ TEST(NullArguments, GiveTheirMessageAndTheDefault) {
 TEST(NullArguments, AreTakenWhereTheyMeanNothing) {
     auto group = MAKE(sg_Function);
     listener ear;
-    CSharp_sg_Function_assign_Function__SWIG_1(group, nullptr);
+    EXPECT_EQ(CSharp_sg_Function_assign_Function__SWIG_1(group, nullptr), nullptr);
     EXPECT_EQ(CSharp_sg_Function_getchosen(group), hqf_sg_Function_chosen_Function);
     EXPECT_EQ(ear.heard(), nothing());
 }

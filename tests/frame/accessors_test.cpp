@@ -10,6 +10,7 @@
 #include <vector>
 
 #include "hqf/hqf.h"
+#include "hqf/xml_in/c_xml_reader_local.h"
 
 namespace {
 
@@ -129,6 +130,8 @@ TEST(accessors, choices) {
     EXPECT_EQ(geometry.set_SphereGeometry(L"Sphere_Included"), 0);
     EXPECT_EQ(geometry.set_SphereGeometry(L"sphere"), 38);
     EXPECT_EQ(geometry.get_SphereGeometry(), L"Sphere_Included");
+    EXPECT_EQ(geometry.set_UnknownGeometry(geometry.get_SphereGeometry()), 0) << "the argument is what is given up";
+    EXPECT_EQ(geometry.get_UnknownGeometry(), L"Sphere_Included");
     EXPECT_EQ(geometry.set_UnknownGeometry(L""), 20);
     EXPECT_EQ(geometry.getchosen(), 2);
 
@@ -163,9 +166,71 @@ TEST(accessors, groups) {
     EXPECT_TRUE(hqf::equal(function, second));
     de94->set_Param_l(2);
     EXPECT_FALSE(hqf::equal(function, second));
+    EXPECT_EQ(&function.assign_Function(de94), de94) << "what is held already stays";
+    EXPECT_EQ(function.assign_FunctionDE94(*de94).get_Param_l(), 2) << "the source is what is given up";
     function.assign_Function(static_cast<FunctionType*>(nullptr));
     EXPECT_EQ(function.getchosen(), 0);
     EXPECT_FALSE(hqf::equal(function, second));
+}
+
+struct open_platform : PlatformType {
+    using PlatformType::unmarshal_body;
+};
+
+struct open_lab : ColorSpaceCIELabType {
+    using ColorSpaceCIELabType::marshal_child_elements;
+};
+
+// A reader that stands behind the first name of a text.
+struct started : lmx::c_read_string, lmx::c_xml_reader {
+    explicit started(const std::string& text)
+        : c_read_string(text)
+        , c_xml_reader(static_cast<c_read&>(*this))
+        , scope((set_ns_map(map), this)) {
+        next();
+    }
+    void next() { get_element_event(nullptr, &error, &name); }
+
+    static constexpr lmx::s_ns_map map[] = {{1000, "Hqf", "http://hqf.example/v2"}, {0, nullptr, nullptr}};
+    lmx::c_xml_reader_local scope;
+    lmx::elmx_error error = lmx::err_no_error;
+    std::string name;
+};
+
+TEST(accessors, parts_of_reading_and_writing) {
+    const std::string format = " xmlns:Hqf='http://hqf.example/v2' "
+                               "xmlns:xsi='http://www.w3.org/2001/XMLSchema-instance'";
+    const std::string options =
+        "<Hqf:I" + format + "><Hqf:Illuminant CustomName='n'>Illuminant_A</Hqf:Illuminant></Hqf:I>";
+    IlluminationOptionsType choice;
+    for (int round = 0; round < 2; ++round) {
+        started reader(options);
+        EXPECT_EQ(choice.unmarshal(reader, reader.name), 0) << "the option that is read is a new one";
+    }
+    const std::string systems = "<Hqf:OperatingSystem>a</Hqf:OperatingSystem><Hqf:OperatingSystemVersion>b"
+                                "</Hqf:OperatingSystemVersion>";
+    const std::string text = "<Hqf:P" + format + ">" + systems + "</Hqf:P>";
+    started reader(text);
+    while (reader.get_attribute_event(nullptr, &reader.error, &reader.name))
+        reader.skip_attribute_value();
+    const lmx::c_xml_reader_local inner(&reader);
+    reader.next();
+    open_platform platform;
+    EXPECT_TRUE(platform.unmarshal_body(reader, &reader.name, &reader.error)) << "with a name of the caller's";
+    EXPECT_EQ(platform.get_OperatingSystemVersion(), L"b");
+    EXPECT_EQ(reader.name, "Hqf:P");
+    const std::string type = "<xsi:type" + format + "/><x/>";
+    started at_type(type);
+    const int event = at_type.get_current_event();
+    EXPECT_FALSE(sg_ColorSpace::is_member(at_type, at_type.name)) << "an element with an attribute's name";
+    EXPECT_EQ(at_type.get_current_event(), event);
+    sg_ColorSpace group;
+    EXPECT_TRUE(group.unmarshal(at_type, &at_type.name, &at_type.error)) << at_type.error;
+    std::ostringstream stream;
+    lmx::c_xml_writer writer(stream, "", "");
+    EXPECT_EQ(ColorSpaceCIELab().marshal(writer, "c"), 46);
+    EXPECT_STREQ(writer.get_namespace_prefix("http://hqf.example/v2"), "Hqf") << "known before the refusal";
+    EXPECT_EQ(open_lab().marshal_child_elements(writer), 46) << "a child that nobody touched is an incomplete one";
 }
 
 TEST(accessors, copies_count_as_set) {

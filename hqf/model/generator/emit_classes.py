@@ -229,7 +229,11 @@ class _Bodies:
                             f"return *static_cast<{item}*>(slot_.object);")
                 self.define(f"const {item}&", f"get_{name}()",
                             f"return frame::option_value<{item}>(slot_, {chosen});", const=True)
-                self.define(f"{item}&", f"assign_{name}(const {item}& value)", f"return get_{name}() = value;")
+                self.assign_chosen(name, item)
+
+    def assign_chosen(self, name: str, item: str) -> None:
+        self.define(f"{item}&", f"assign_{name}(const {item}& value)",
+                    f"{item} copy(value); return frame::swapped(get_{name}(), copy);")
 
     def group(self) -> None:
         self.chosen_accessor()
@@ -239,7 +243,7 @@ class _Bodies:
                         f"return *static_cast<{item}*>(frame::choose_member({self.rows}, this, {chosen}));")
             self.define(f"const {item}&", f"get_{name}()",
                         f"return frame::member_object<{item}>(slot_, {chosen});", const=True)
-            self.define(f"{item}&", f"assign_{name}(const {item}& value)", f"return get_{name}() = value;")
+            self.assign_chosen(name, item)
             if entry.needs_xsi_type:
                 self.define(f"{item}&", f"assign_{name}({item}* object)",
                             f"slot_.hold({chosen}, object); return frame::object_or_spare(object);")
@@ -273,11 +277,14 @@ class _Bodies:
             self.define(ERROR, f"marshal_child_elements({WRITER})",
                         f"return frame::write_group({rows}, this, writer);")
             return
+        # An element class has the writer know its namespaces, then is its type: also where that refuses.
+        is_type_alone = cls.form == "element" and not cls.nillable
+        select = "writer.conditionally_select_ns_map(frame::namespace_map); " if is_type_alone else ""
         self.define(ERROR, f"marshal({WRITER}, const char* name)",
-                    f"return frame::write_element({rows}, this, writer, name);")
+                    f"{select}return frame::write_element({rows}, this, writer, name);")
         self.define(ERROR, f"unmarshal({READER}, const std::string& name)",
                     f"return frame::read_element({rows}, this, reader, name);")
-        if cls.form == "element" and not cls.nillable:
+        if is_type_alone:
             return
         self.define("void", f"marshal_attributes({WRITER})", f"frame::write_attributes({rows}, this, writer);",
                     const=True)
@@ -288,8 +295,8 @@ class _Bodies:
         self.define(ERROR, f"unmarshal_attributes_check({READER})",
                     f"return frame::check_attributes({rows}, this, reader);")
         if self.vocabulary.body(cls):
-            self.define("bool", f"unmarshal_body({READER}, std::string*, {ERROR}* error, bool has_body)",
-                        f"return frame::read_simple_body({rows}, this, reader, error, has_body);")
+            self.define("bool", f"unmarshal_body({READER}, std::string* name, {ERROR}* error, bool has_body)",
+                        f"return frame::read_simple_body({rows}, this, reader, name, error, has_body);")
         else:
-            self.define("bool", f"unmarshal_body({READER}, std::string*, {ERROR}* error)",
-                        f"return frame::read_body({rows}, this, reader, error);")
+            self.define("bool", f"unmarshal_body({READER}, std::string* name, {ERROR}* error)",
+                        f"return frame::read_body({rows}, this, reader, name, error);")

@@ -145,6 +145,9 @@ def _expression(export: Export, inner: dict[str, str]) -> str:
     if export.shape == "static":
         return made.format(f"{cls}::{export.operation}({', '.join(values)})")
     call = f"{values[0]}.{export.operation}({', '.join(values[1:])})"
+    if export.role == "assign" and export.arguments[-1].kind == "object":
+        # The object itself comes back, also where it is none.
+        return f"static_cast<void>({call}), {inner[export.arguments[-1].name]}"
     if export.result == Result("object", export.result.cls, owned=True) and export.operation != "clone":
         return f"new {export.result.cls}({call})"
     return made.format(call)

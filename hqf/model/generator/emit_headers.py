@@ -45,6 +45,8 @@ class _Header:
         includes = ["<string>"] + [f'"hqf/model/{name}.h"' for name in self.by_value()] + [
             '"hqf/errors/elmx_error.h"', '"hqf/frame/pool.h"', '"hqf/frame/storage.h"', '"hqf/platform/api.h"']
         used = "\n".join(self.lines)
+        if cls.document:
+            includes.append('"hqf/document/XMLDocumentResult.h"')
         if "lmx::c_datetime" in used:
             includes.append('"hqf/values/c_datetime.h"')
         if "lmx::c_binary" in used:
@@ -421,7 +423,6 @@ class _Header:
         self.add(f"{before}lmx::elmx_error unmarshal(lmx::c_xml_reader& reader, const std::string& name){behind};")
 
     def document(self) -> None:
-        self.forward.add("XMLDocumentResult")
         self.storage.append("/// Bytes of the text last read or written: about what the next write will take.")
         self.storage.append("std::size_t text_size_ = 0;")
         self.add()
