@@ -19,6 +19,10 @@ namespace {
 /// Blocks grow from one that a small document fills to one that a large document notes no more.
 constexpr std::size_t first_block = 64 * 1024, largest_block = 4 * 1024 * 1024;
 
+/// What is widened stays in the cache beside what it becomes. A file is written block by block, each a call of the
+/// system.
+constexpr std::size_t block_to_widen = 64 * 1024, block_to_file = 256 * 1024;
+
 /// What the system keeps files in.
 constexpr std::size_t page = 4096;
 
@@ -94,7 +98,8 @@ text_buffer::~text_buffer() {
 void text_buffer::begin_block() {
     if (take_ != nullptr && !blocks_.empty()) return empty_block();
     note_use();
-    const std::size_t capacity = std::min(first_block << std::min<std::size_t>(blocks_.size(), 8), largest_block);
+    const std::size_t grown = std::min(first_block << std::min<std::size_t>(blocks_.size(), 8), largest_block);
+    const std::size_t capacity = take_ != nullptr ? block_size_ : grown;
     blocks_.reserve(blocks_.size() + 1);
     void* const place = allocate_for_filling(capacity);
     if (place == nullptr) throw std::bad_alloc();
@@ -159,7 +164,7 @@ std::streamsize text_buffer::xsputn(const char* data, std::streamsize size) {
 file_stream::file_stream(const char* name)
     : std::ostream(nullptr)
     , file_(std::fopen(name, "w"))
-    , buffer_(take, static_cast<void*>(this)) {
+    , buffer_(take, static_cast<void*>(this), block_to_file) {
     rdbuf(&buffer_);
     // Blocks come from the buffer above, so they needn't go through another.
     if (is_open()) std::setvbuf(file_, nullptr, _IONBF, 0);
@@ -215,7 +220,7 @@ void gather(std::wstring& out, std::size_t expected, const stream_call& write) {
     fill_new(text, with_reserve(expected), [&](wchar_t* memory, std::size_t size) {
         wide.at = memory;
         wide.limit = memory + size;
-        text_stream stream(wide_target::take, static_cast<void*>(&wide));
+        text_stream stream(wide_target::take, static_cast<void*>(&wide), block_to_widen);
         is_wanted = write(stream);
         if (is_wanted) stream.buffer().finish();
         return static_cast<std::size_t>(wide.at - memory);

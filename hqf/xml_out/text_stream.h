@@ -19,10 +19,11 @@ public:
     using block_taker = std::size_t (*)(void* target, const char* text, std::size_t size, bool is_last);
 
     text_buffer() = default;
-    /// Gathers in one block, which `take` empties whenever it is full.
-    text_buffer(block_taker take, void* target)
+    /// Gathers in one block of that size, which `take` empties whenever it is full.
+    text_buffer(block_taker take, void* target, std::size_t size)
         : take_(take)
-        , target_(target) {}
+        , target_(target)
+        , block_size_(size) {}
     /// Gathers in memory of the caller's first, and in blocks what doesn't fit there.
     text_buffer(char* memory, std::size_t size) { setp(memory, memory + size); }
     text_buffer(const text_buffer&) = delete;
@@ -68,6 +69,7 @@ private:
 
     const block_taker take_ = nullptr;
     void* const target_ = nullptr;
+    const std::size_t block_size_ = 0;
     std::size_t used_in_memory_ = 0;
     /// The last is the one that the put area lies in; its use is noted when someone asks.
     std::vector<block> blocks_;

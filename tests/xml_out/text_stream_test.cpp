@@ -51,9 +51,9 @@ TEST(file_stream, sizes_around_pages_and_blocks) {
     const support::folder folder;
     const std::string name = (folder / "f").string();
     std::string text;
-    while (text.size() < 200000)
+    while (text.size() < 600000)
         text += std::to_string(text.size()) + ' ';
-    for (const std::size_t size : {0u, 1u, 4095u, 4096u, 4097u, 65535u, 65536u, 65537u, 131072u, 200000u}) {
+    for (const std::size_t size : {0u, 1u, 4095u, 4096u, 4097u, 262143u, 262144u, 262145u, 524288u, 600000u}) {
         hqf::file_stream stream(name.c_str());
         ASSERT_TRUE(put_in_pieces(stream, text.substr(0, size)) && stream.close()) << size;
         EXPECT_EQ(support::bytes_of(name), text.substr(0, size)) << size;
