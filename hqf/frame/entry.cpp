@@ -25,7 +25,13 @@ lmx::elmx_error gathered(text_type* out, void* object, const char* name, write_c
 lmx::elmx_error write_file(const char* file_name, void* object, const char* name, write_call write) {
     file_stream stream(file_name);
     if (!stream.is_open()) return lmx::err_unable_to_open_file;
-    lmx::elmx_error error = write_stream(stream, object, name, write);
+    lmx::elmx_error error = lmx::err_no_error;
+    try {
+        error = write_stream(stream, object, name, write);
+    } catch (...) {
+        std::remove(file_name);
+        throw;
+    }
     if (!stream.close() && error == lmx::err_no_error) error = lmx::err_undefined_error;
     if (error != lmx::err_no_error) std::remove(file_name);
     return error;

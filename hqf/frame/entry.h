@@ -21,7 +21,7 @@ inline constexpr char layout_tab[] = "\t";
 inline constexpr char layout_newline[] = "\n";
 
 /// Writes to a file that is truncated first and deleted after a failure. 1 if it can't be opened, 42 if the stream
-/// failed in a write that was otherwise complete.
+/// failed in a write that was otherwise complete. What is thrown on the way deletes the file, too, and passes through.
 lmx::elmx_error write_file(const char* file_name, void* object, const char* name, write_call write);
 /// Assigns to `*out` when the code is 0. `text_size`, if there is one, holds what to expect, and then the size.
 lmx::elmx_error write_string(std::string* out, void* object, const char* name, write_call write,

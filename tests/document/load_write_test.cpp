@@ -83,6 +83,12 @@ TEST(write_file, failures_leave_no_file) {
     EXPECT_EQ(long_one.writeFile(wide(place / "long.hqf")), 46);
     EXPECT_FALSE(std::filesystem::exists(place / "long.hqf"));
 
+    struct : hqf_v2::FunctionDE {
+        lmx::elmx_error marshal(lmx::c_xml_writer&, const char*) override { throw std::bad_alloc(); }
+    } without_memory;
+    EXPECT_THROW(static_cast<hqf_v2::FunctionDE&>(without_memory).marshal((place / "thrown").c_str()), std::bad_alloc);
+    EXPECT_FALSE(std::filesystem::exists(place / "thrown"));
+
     // A disk without room, reached by a link: never name the device itself, since the file is deleted.
     if (!std::filesystem::exists("/dev/full")) GTEST_SKIP() << "no /dev/full";
     long_one.clear_ColorQualityControl();
