@@ -36,9 +36,11 @@ COMPARISONS = (
     ("load", "expat", LOAD_FLOORS, ("hqf", "expat", "pugixml")),
     ("write", "pugixml", WRITE_FLOORS, ("hqf", "pugixml", "pugixml_raw")),
 )
-# What else is done with a document: the row, the row that it is set beside, and how many times as long it may take.
+# What else is done with a document: the row, the row that it is set beside, and how many times as long it may take; 0
+# where the row only explains another.
 OTHER_ROWS = (("load/hqf_file", "load/hqf", 1.2), ("load/hqf_string", "load/hqf", 1.4),
-              ("write/hqf_file", "write/hqf", 1.4), ("write/hqf_string", "write/hqf", 1.4),
+              ("write/hqf_file", "write/hqf", 1.4), ("write/hqf_old_file", "write/hqf", 0),
+              ("write/hqf_string", "write/hqf", 1.4), ("write/wide_memory", "write/hqf", 0),
               ("objects/destroy", "load/hqf", 1.0), ("objects/copy", "load/hqf", 1.0),
               ("objects/equal", "load/hqf", 1.0))
 
@@ -82,9 +84,10 @@ def other_speeds(rows: dict[str, Row], documents: list[tuple[str, str]]) -> str:
             row, beside = (rows.get(f"{task}/{kind}/{size}/{peer}")
                            for task, peer in (name.split("/"), base.split("/")))
             times = beside.speed / row.speed if row and beside else None
-            cells.append("-" if times is None else f"{times:.2f}" + (" above" if times > limit else ""))
+            cells.append("-" if times is None else f"{times:.2f}" + (" above" if 0 < limit < times else ""))
         lines.append([kind, size, *cells])
-    return markdown(["kind", "size", *(f"{name} / {base} ({limit})" for name, base, limit in OTHER_ROWS)], lines)
+    return markdown(["kind", "size", *(f"{name} / {base}" + (f" ({limit})" if limit else "")
+                                       for name, base, limit in OTHER_ROWS)], lines)
 
 
 def heap_table(build: Path, sizes: str, cpu: int | None) -> str:
