@@ -1,9 +1,10 @@
 #include "hqf/frame/objects.h"
 
-#include <bit>
 #include <cmath>
 #include <cstring>
 #include <memory>
+
+#include "hqf/frame/presence.h"
 
 namespace hqf::frame {
 
@@ -150,15 +151,6 @@ bool equal_rows(const row& r, const void* a, const void* b) {
     return equal_members(*r.type, left.object, right.object);
 }
 
-/// Whether all rows that have a bit are there.
-bool are_there(std::uint32_t bits, const row* rows, const void* object) {
-    for (; bits != 0; bits &= bits - 1) {
-        const row& r = rows[std::countr_zero(bits)];
-        if (r.is_list() ? member_at<list_base>(object, r.value).size() == 0 : !flag_of(r, object)) return false;
-    }
-    return true;
-}
-
 choice_slot& choice_of(const class_rows& rows, void* object) {
     return member_at<choice_slot>(object, rows.slot);
 }
@@ -271,9 +263,7 @@ bool equal_members(const class_rows& rows, const void* a, const void* b) {
 }
 
 bool is_occurs_ok(const class_rows& rows, const void* object) {
-    if (rows.slot != 0) return member_at<int>(object, rows.slot) != rows.none();
-    if (rows.is_nil(object)) return true;
-    return are_there(rows.needed_attributes, rows.attributes, object) && are_there(rows.needed_rows, rows.rows, object);
+    return has_mandatory_members(rows, object);
 }
 
 void release_choice(const class_rows& rows, void* object) {

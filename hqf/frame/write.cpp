@@ -3,6 +3,7 @@
 #include <cstring>
 
 #include "hqf/frame/objects.h"
+#include "hqf/frame/presence.h"
 #include "hqf/xml_out/output.h"
 
 namespace hqf::frame {
@@ -50,6 +51,7 @@ private:
 
     char* element(char* at, const class_rows& rows, void* object, const tag& name);
     char* attributes(char* at, const class_rows& rows, const void* object);
+    char* body(char* at, const class_rows& rows, const void* object);
     char* content(char* at, const class_rows& rows, void* object);
     char* group(char* at, const class_rows& rows, void* object);
     char* start(char* at, const class_rows& rows, const tag& name);
@@ -60,7 +62,11 @@ private:
     char* bad_selector(const char* at, const class_rows& rows);
     char* list(char* at, const row& r, const list_base& items);
     char* any_items(char* at, const list_base& items);
-    char* stored_value(char* at, const row& r, const void* object);
+    /// Writes a single simple value as it is stored; behind it an end tag has room. Most values are numbers.
+    char* stored_value(char* at, const row& r, const void* object) {
+        return r.what == kind::real ? out_.value(at, member_at<double>(object, r.value)) : other_value(at, r, object);
+    }
+    char* other_value(char* at, const row& r, const void* object);
     char* literal(char* at, const enumerated& value, const literals& texts);
 
     template<class value_type>
@@ -111,7 +117,7 @@ char* element_writer::type_attribute(char* at, const class_rows& rows) {
 }
 
 char* element_writer::element(char* at, const class_rows& rows, void* object, const tag& name) {
-    if (!is_occurs_ok(rows, object)) return failed(at, lmx::err_min_max_occurs_error_on_marshaling);
+    if (!has_mandatory_members(rows, object)) return failed(at, lmx::err_min_max_occurs_error_on_marshaling);
     at = start(at, rows, name);
     if (rows.is_nil(object)) {
         if (rows.attributes_when_nil) at = attributes(at, rows, object);
@@ -121,7 +127,7 @@ char* element_writer::element(char* at, const class_rows& rows, void* object, co
     if (rows.attribute_count != 0) at = attributes(at, rows, object);
     at = out_.room(at);
     *at++ = '>';
-    if (rows.shape == form::simple_content) return end_tag(content(at, rows, object), name);
+    if (rows.shape == form::simple_content) return end_tag(body(at, rows, object), name);
     at = out_.line_end(at);
     writer().indent();
     at = content(at, rows, object);
@@ -140,10 +146,8 @@ char* element_writer::attributes(char* at, const class_rows& rows, const void* o
     return at;
 }
 
-/// Writes a single simple value as it is stored; behind it an end tag has room.
-char* element_writer::stored_value(char* at, const row& r, const void* object) {
+char* element_writer::other_value(char* at, const row& r, const void* object) {
     switch (r.what) {
-    case kind::real: return out_.value(at, member_at<double>(object, r.value));
     case kind::text: return out_.value(at, member_at<std::wstring>(object, r.value));
     case kind::enumerated: return literal(at, member_at<enumerated>(object, r.value), *r.rules->texts);
     case kind::integer: return out_.value(at, member_at<int>(object, r.value));
@@ -163,20 +167,26 @@ char* element_writer::literal(char* at, const enumerated& value, const literals&
     return out_.room(out_.text(at, texts.narrow[number - 1], texts.lengths[number - 1]));
 }
 
+/// The value of simple content; behind it an end tag has room.
+char* element_writer::body(char* at, const class_rows& rows, const void* object) {
+    const row& r = *rows.rows;
+    // An optional one that is unset leaves the element empty.
+    if (!r.has(mandatory_row) && !member_at<bool>(object, r.flag)) return at;
+    return stored_value(out_.room(at), r, object);
+}
+
 char* element_writer::content(char* at, const class_rows& rows, void* object) {
     switch (rows.shape) {
     case form::choice: return choice(at, rows, object);
     case form::group: return group(at, rows, object);
-    case form::simple_content:
-        // An optional body that is unset leaves the element empty.
-        if (!rows.rows->has(mandatory_row) && !member_at<bool>(object, rows.rows->flag)) return at;
-        return stored_value(out_.room(at), *rows.rows, object);
+    case form::simple_content: return body(at, rows, object);
     default: break;
     }
     for (const row* r = rows.rows; r != rows.rows + rows.row_count && at != nullptr; ++r) {
-        if (r->is_list())
-            at = list(at, *r, member_at<list_base>(object, r->value));
-        else if (r->has(mandatory_row) || r->has(always_written) || member_at<bool>(object, r->flag))
+        if (r->is_list()) {
+            const auto& items = member_at<list_base>(object, r->value);
+            if (items.size() != 0) at = list(at, *r, items);
+        } else if (r->has(mandatory_row) || r->has(always_written) || member_at<bool>(object, r->flag))
             at = child(at, *r, object);
     }
     return at;
