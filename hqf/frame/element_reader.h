@@ -82,6 +82,7 @@ private:
     void fast_children(row_cursor& at);
     bool fast_child(window& in, const char* at, const row& r, int member);
     bool fast_real(window& in, const char* at, const row& r);
+    bool fast_literal(window& in, const char* at, const row& r);
     bool fast_simple(window& in, const char* at, const row& r);
     bool value_read(window& in, const char* at, const row& r);
     bool fast_text_item(window& in, const char* at, const row& r);

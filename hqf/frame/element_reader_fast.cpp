@@ -174,6 +174,7 @@ bool element_reader::fast_child(window& in, const char* at, const row& r, int me
     case kind::text_list: return fast_text_item(in, at, r);
     case kind::moment_list: return fast_moment_item(in, at, r);
     case kind::real: return fast_real(in, at, r);
+    case kind::enumerated: return fast_literal(in, at, r);
     default: return fast_simple(in, at, r);
     }
 }
@@ -185,6 +186,17 @@ bool element_reader::fast_real(window& in, const char* at, const row& r) {
     at = parse_real(in, at, r.rules, '<', value);
     if (at == nullptr || (at = close_tag(in, at, *r.name)) == nullptr) return false;
     member_at<double>(object_, r.value) = value;
+    return value_read(in, at, r);
+}
+
+bool element_reader::fast_literal(window& in, const char* at, const row& r) {
+    at += r.name->length;
+    if (at[-1] != '>') return false;
+    const char* const end = in.find(at, '<');
+    if (end == nullptr) return false;
+    const int number = r.rules->texts->number_of(at, static_cast<std::size_t>(end - at));
+    if (number == 0 || (at = close_tag(in, end, *r.name)) == nullptr) return false;
+    member_at<enumerated>(object_, r.value).set_number(number);
     return value_read(in, at, r);
 }
 
