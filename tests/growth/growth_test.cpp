@@ -90,7 +90,7 @@ struct document_row {
     bool is_deep = false;
 };
 
-// Depth is held to 1,000 elements and entities, and a parent colour space is two elements.
+// Depth is held to 1,000 elements, and in attributes to as many entities; a parent colour space is two elements.
 const document_row documents[] = {
     {"attributes, unknown", 500, {.colour = "{ a@='v'}"}, 1},
     {"attributes, of the instance", 500, {.colour = "{ xsi:a@='v'}"}},
