@@ -15,8 +15,6 @@ class c_get_with_entities;
 /// Where the name of a reference is read from.
 class HQF_API c_entity_name_reader {
 public:
-    /// \param is_stream_value whether the entity's value is to be pushed on the character stream, markup and all;
-    /// otherwise it is expanded in place
     explicit c_entity_name_reader(bool is_stream_value = false)
         : is_stream(is_stream_value) {}
     c_entity_name_reader(const c_entity_name_reader&) = delete;
@@ -28,6 +26,8 @@ public:
     /// Gives a byte back.
     virtual void unget(int c) = 0;
 
+    /// Whether the entity's value is to be pushed on the character stream, markup and all; otherwise it is expanded in
+    /// place.
     bool is_stream;
 };
 
