@@ -37,7 +37,9 @@ public:
     /// \throws std::bad_alloc; `text` is as it was.
     void move_blocks_to(std::string& text);
     /// Hands the last text over to the taker.
-    void finish() { take_(target_, pbase(), gathered(), true); }
+    void finish() {
+        if (gathered() != 0) take_(target_, pbase(), gathered(), true);
+    }
 
     /// Where the next text may be written, with room for `size` bytes at least up to room_end(); at most 64 KB can be
     /// asked for.
